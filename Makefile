@@ -1,0 +1,30 @@
+# Every target bootstraps the machine first, so each is one command on a fresh Debian machine.
+.PHONY: bootstrap demo test dev bench format clean
+
+bootstrap:
+	@scripts/bootstrap
+
+demo: bootstrap
+	cmake --preset release
+	cmake --build --preset release
+	scripts/run-demo build/release
+
+test: bootstrap
+	cmake --preset asan
+	cmake --build --preset asan
+	ctest --preset asan
+
+dev: bootstrap
+	cmake --preset dev
+	cmake --build --preset dev
+
+bench: bootstrap
+	cmake --preset release -DEC_BUILD_BENCH=ON
+	cmake --build --preset release
+	for b in build/release/Bench/*Bench; do $$b; done
+
+format:
+	git ls-files '*.h' '*.cpp' | xargs clang-format -i
+
+clean:
+	rm -rf build

@@ -1,0 +1,38 @@
+# Compiler settings shared by every target of the project.
+add_library(ec_options INTERFACE)
+target_compile_options(ec_options INTERFACE
+  -Wall -Wextra -Wpedantic -Werror
+  -Wshadow -Wnon-virtual-dtor -Woverloaded-virtual -Wcast-align
+  -Wnull-dereference -Wimplicit-fallthrough -Wmissing-declarations)
+target_include_directories(ec_options INTERFACE ${PROJECT_SOURCE_DIR})
+
+if(EC_SANITIZE)
+  set(ec_sanitize_flags -fsanitize=address,undefined -fno-sanitize-recover=all -fno-omit-frame-pointer)
+  target_compile_options(ec_options INTERFACE ${ec_sanitize_flags})
+  target_link_options(ec_options INTERFACE ${ec_sanitize_flags})
+endif()
+
+# ec_add_library(NAME DIR [DEPS...]): one library per folder, made of every .cpp in it.
+# Globbing keeps parallel work on one folder free of edits to a shared source list.
+function(ec_add_library name dir)
+  file(GLOB sources CONFIGURE_DEPENDS ${dir}/*.cpp)
+  file(GLOB headers CONFIGURE_DEPENDS ${dir}/*.h)
+  if(sources)
+    add_library(${name} STATIC ${sources} ${headers})
+    target_link_libraries(${name} PUBLIC ec_options ${ARGN})
+  else()
+    add_library(${name} INTERFACE)
+    target_link_libraries(${name} INTERFACE ec_options ${ARGN})
+  endif()
+endfunction()
+
+# ec_add_test(NAME DIR [DEPS...]): one GoogleTest program made of every .cpp in DIR.
+function(ec_add_test name dir)
+  file(GLOB sources CONFIGURE_DEPENDS ${dir}/*.cpp)
+  if(NOT sources)
+    return()
+  endif()
+  add_executable(${name} ${sources})
+  target_link_libraries(${name} PRIVATE ec_options GTest::gtest GTest::gmock GTest::gtest_main ${ARGN})
+  gtest_discover_tests(${name} WORKING_DIRECTORY ${PROJECT_SOURCE_DIR} DISCOVERY_TIMEOUT 60)
+endfunction()
