@@ -1,0 +1,133 @@
+#pragma once
+
+#include <optional>
+#include <string_view>
+
+#include "Host/Toolkit/Geometry.h"
+
+// The toolkit's pictures ("decals"), each drawn as a vector glyph (see Bitmap::GetBitmap).
+// Keyframe glyphs: index = 6 x kind + variant, kinds Linear, Bezier, AutoBezier, Hold, EaseIn,
+// EaseOut; variants Normal, FirstNormal, LastNormal, Selected, FirstSelected, LastSelected
+// ("First" is the right half of the glyph for a first keyframe, "Last" the left half).
+// Keyframe glyphs are 16 x 16 with their centre on pixel (7, 8), so a glyph drawn at
+// (x - 7, centreY - 8) sits on x and centreY.
+enum Decal : int {
+  kEffectControlsKeyLinearNormalDecal,
+  kEffectControlsKeyLinearFirstNormalDecal,
+  kEffectControlsKeyLinearLastNormalDecal,
+  kEffectControlsKeyLinearSelectedDecal,
+  kEffectControlsKeyLinearFirstSelectedDecal,
+  kEffectControlsKeyLinearLastSelectedDecal,
+  kEffectControlsKeyBezierNormalDecal,
+  kEffectControlsKeyBezierFirstNormalDecal,
+  kEffectControlsKeyBezierLastNormalDecal,
+  kEffectControlsKeyBezierSelectedDecal,
+  kEffectControlsKeyBezierFirstSelectedDecal,
+  kEffectControlsKeyBezierLastSelectedDecal,
+  kEffectControlsKeyAutoBezierNormalDecal,
+  kEffectControlsKeyAutoBezierFirstNormalDecal,
+  kEffectControlsKeyAutoBezierLastNormalDecal,
+  kEffectControlsKeyAutoBezierSelectedDecal,
+  kEffectControlsKeyAutoBezierFirstSelectedDecal,
+  kEffectControlsKeyAutoBezierLastSelectedDecal,
+  kEffectControlsKeyHoldNormalDecal,
+  kEffectControlsKeyHoldFirstNormalDecal,
+  kEffectControlsKeyHoldLastNormalDecal,
+  kEffectControlsKeyHoldSelectedDecal,
+  kEffectControlsKeyHoldFirstSelectedDecal,
+  kEffectControlsKeyHoldLastSelectedDecal,
+  kEffectControlsKeyEaseInNormalDecal,
+  kEffectControlsKeyEaseInFirstNormalDecal,
+  kEffectControlsKeyEaseInLastNormalDecal,
+  kEffectControlsKeyEaseInSelectedDecal,
+  kEffectControlsKeyEaseInFirstSelectedDecal,
+  kEffectControlsKeyEaseInLastSelectedDecal,
+  kEffectControlsKeyEaseOutNormalDecal,
+  kEffectControlsKeyEaseOutFirstNormalDecal,
+  kEffectControlsKeyEaseOutLastNormalDecal,
+  kEffectControlsKeyEaseOutSelectedDecal,
+  kEffectControlsKeyEaseOutFirstSelectedDecal,
+  kEffectControlsKeyEaseOutLastSelectedDecal,
+  kEffectControlsKeyTRDualControlPointNormalDecal,
+  kEffectControlsKeyTRDualControlPointSelectedDecal,
+  kEffectControlsKeyTRLeftControlPointNormalDecal,
+  kEffectControlsKeyTRLeftControlPointSelectedDecal,
+  kEffectControlsKeyTRRightControlPointNormalDecal,
+  kEffectControlsKeyTRRightControlPointSelectedDecal,
+  kEffectControlsKeyTRHoldControlPointNormalDecal,
+  kEffectControlsKeyTRHoldControlPointSelectedDecal,
+  kEffectControlsKeyTRDualHoldRightNormalDecal,
+  kEffectControlsKeyTRDualHoldRightSelectedDecal,
+  kEffectControlsKeyTRDualHoldLeftNormalDecal,
+  kEffectControlsKeyTRDualHoldLeftSelectedDecal,
+  kEffectControlsKeySumNormalDecal,
+  kChevronUpNormalDecal,
+  kChevronDownNormalDecal,
+  kChevronLeftNormalDecal,
+  kChevronRightNormalDecal,
+  kDisclosureTriangleClosedDecal,
+  kDisclosureTriangleOpenDecal,
+  kEffectControlsOnToggleNormalDecal,
+  kEffectControlsOffToggleNormalDecal,
+  kTLVideoMuteButtonNormalDecal,
+  kTLVideoMuteOffButtonNormalDecal,
+  kEffectControlsSetupNormalDecal,
+  kEffectControlsResetNormalDecal,
+  kEffectControlsPresetNormalDecal,
+  kDirectManipulationDecal,
+  kStopwatchOffDecal,
+  kStopwatchOnDecal,
+  kKeyframeNavigatorPreviousDecal,
+  kKeyframeNavigatorNextDecal,
+  kKeyframeNavigatorAddDecal,
+  kKeyframeNavigatorRemoveDecal,
+  kPlayNormalDecal,
+  kStopNormalDecal,
+  kLoopNormalDecal,
+  kLoopOnDecal,
+  kPanelMenuDecal,
+  kNoHeadMaterialDecal,
+  kNoTailMaterialDecal,
+  kTitlerEllipseNormalDecal,
+  kTitlerRectNormalDecal,
+  kToolsPenDecal,
+  kTrackerStepBackDecal,
+  kTrackerReverseDecal,
+  kTrackerStopDecal,
+  kTrackerPlayDecal,
+  kTrackerStepForwardDecal,
+  kPlaybackSettingsSmallDecal,
+  kUIFColorPickerOffDecal,
+  kUIFColorPickerOnDecal,
+  kEffectControlsAudioTransitionConstantPowerDecal,
+  kEffectControlsAudioTransitionConstantGainDecal,
+  kEffectControlsSampleADecal,
+  kEffectControlsSampleBDecal,
+  kEffectControlsTransitionArrowEastDecal,
+  kEffectControlsTransitionArrowEastSelectedDecal,
+  kEffectControlsTransitionArrowNorthDecal,
+  kEffectControlsTransitionArrowNorthSelectedDecal,
+  kEffectControlsTransitionArrowNorthEastDecal,
+  kEffectControlsTransitionArrowNorthEastSelectedDecal,
+  kEffectControlsTransitionArrowNorthWestDecal,
+  kEffectControlsTransitionArrowNorthWestSelectedDecal,
+  kEffectControlsTransitionArrowSouthDecal,
+  kEffectControlsTransitionArrowSouthSelectedDecal,
+  kEffectControlsTransitionArrowSouthEastDecal,
+  kEffectControlsTransitionArrowSouthEastSelectedDecal,
+  kEffectControlsTransitionArrowSouthWestDecal,
+  kEffectControlsTransitionArrowSouthWestSelectedDecal,
+  kEffectControlsTransitionArrowWestDecal,
+  kEffectControlsTransitionArrowWestSelectedDecal,
+  kDecalCount
+};
+
+inline constexpr Decal kFirstKeyframeDecal = kEffectControlsKeyLinearNormalDecal;
+inline constexpr int kKeyframeDecalKinds = 6;
+inline constexpr int kKeyframeDecalVariants = 6;
+
+// The identifier as written in code, e.g. "kChevronUpNormalDecal"; "" for values out of range.
+std::string_view GetDecalName(Decal decal);
+std::optional<Decal> FindDecalByName(std::string_view name);
+// Logical size of the decal's picture; 0 x 0 for values out of range.
+Size GetDecalSize(Decal decal);
