@@ -120,26 +120,42 @@ std::string QualifiedFunctionName(std::string_view pretty) {
       start = i + 1;
     }
   }
-  // A trailing "operator" keeps whatever space it had before it, e.g. "Foo::operator()".
   const std::string_view name = text.substr(start);
-  return name.empty() ? std::string(pretty) : std::string(name);
+  // Parentheses left in the name mean a declarator this does not understand (a function
+  // returning a function pointer); better the whole text than a wrong name.
+  const auto operatorAt = name.find("operator");
+  const std::string_view beforeOperator = name.substr(0, operatorAt);
+  if (name.empty() || beforeOperator.find_first_of("()") != std::string_view::npos) {
+    return std::string(pretty);
+  }
+  return std::string(name);
 }
 
-void ReportDebugAssertion(std::string_view message, std::string_view condition,
-                          std::string_view file, int line, std::string_view function) {
+namespace {
+
+void Record(DebugAssertionRecord record) {
   auto& store = GetAssertionStore();
   const std::lock_guard lock(store.mutex);
-  for (auto& record : store.records) {
-    if (record.line == line && record.message == message && record.file == file) {
-      ++record.count;
+  for (auto& known : store.records) {
+    if (known.line == record.line && known.message == record.message && known.file == record.file) {
+      ++known.count;
       return;
     }
   }
-  DebugAssertionRecord record{std::string(message), std::string(condition), std::string(file), line,
-                              QualifiedFunctionName(function)};
-  std::cerr << "Debug assertion: " << record.message << " (" << record.condition << ") at "
-            << record.file << ':' << record.line << " in " << record.function << std::endl;
+  std::cerr << "Debug assertion: " << record.message << " (" << record.condition << ")";
+  if (!record.file.empty()) {
+    std::cerr << " at " << record.file << ':' << record.line;
+  }
+  std::cerr << " in " << record.function << std::endl;
   store.records.push_back(std::move(record));
+}
+
+}  // namespace
+
+void ReportDebugAssertion(std::string_view message, std::string_view condition,
+                          std::string_view file, int line, std::string_view function) {
+  Record({std::string(message), std::string(condition), std::string(file), line,
+          QualifiedFunctionName(function)});
 }
 
 const std::vector<DebugAssertionRecord>& RecordedDebugAssertions() {
@@ -157,7 +173,8 @@ NullInterfaceException::NullInterfaceException(std::string_view interfaceName)
       mInterfaceName(interfaceName) {}
 
 void ReportNullInterface(const NullInterfaceException& exception, std::string_view where) {
-  ReportDebugAssertion(exception.what(), exception.GetInterfaceName(), "", 0, where);
+  Record({exception.what(), "RequireInterface(" + exception.GetInterfaceName() + ")", "", 0,
+          "dispatch of " + std::string(where)});
 }
 
 void Trace(std::string_view category, std::string_view text) {

@@ -1,5 +1,6 @@
 #include "Host/Messaging/MessageLoop.h"
 
+#include <iterator>
 #include <utility>
 
 #include "Host/Messaging/Diagnostics.h"
@@ -41,7 +42,24 @@ std::size_t MessageLoop::RunPending() {
     ++delivered;
   }
 
-  for (auto& task : tasks) {
+  // A task that throws leaves the ones after it queued for the next run.
+  std::size_t next = 0;
+  struct RequeueGuard {
+    MessageLoop& loop;
+    std::vector<std::function<void()>>& tasks;
+    std::size_t& next;
+    ~RequeueGuard() {
+      if (next < tasks.size()) {
+        const std::lock_guard lock(loop.mMutex);
+        loop.mIdleTasks.insert(
+            loop.mIdleTasks.begin(),
+            std::make_move_iterator(tasks.begin() + static_cast<std::ptrdiff_t>(next)),
+            std::make_move_iterator(tasks.end()));
+      }
+    }
+  } requeue{*this, tasks, next};
+  while (next < tasks.size()) {
+    auto task = std::move(tasks[next++]);
     try {
       task();
     } catch (const NullInterfaceException& exception) {
