@@ -1,0 +1,1141 @@
+#include "Host/Model/KeyframeCurve.h"
+
+#include <algorithm>
+#include <cmath>
+#include <iterator>
+
+namespace {
+
+// Limits that keep every product of a value, a speed and a segment length far from overflow.
+constexpr double kMaximumValue = 1e100;
+constexpr double kMaximumSpeed = 1e200;
+// An edit of keyframe k changes auto tangents at k +- 1, path lengths of segments k - 2 .. k + 1,
+// auto speeds at k +- 2 and segments k - 3 .. k + 2; refreshing k +- 4 covers them all.
+constexpr std::size_t kRefreshRadius = 4;
+// A sampler walks this many segments before it falls back to a binary search.
+constexpr int kCursorSteps = 8;
+
+constexpr double kTicksPerSecondD = static_cast<double>(kTicksPerSecond);
+
+bool IsPathKind(ParamValueKind kind) {
+  return kind == ParamValueKind::Point || kind == ParamValueKind::Color;
+}
+
+double Seconds(double ticks) {
+  return ticks / kTicksPerSecondD;
+}
+
+double Length(ParamPoint p) {
+  return std::hypot(p.x, p.y);
+}
+
+bool IsZero(ParamPoint p) {
+  return p.x == 0.0 && p.y == 0.0;
+}
+
+ParamPoint Minus(ParamPoint a, ParamPoint b) {
+  return {a.x - b.x, a.y - b.y};
+}
+ParamPoint Plus(ParamPoint a, ParamPoint b) {
+  return {a.x + b.x, a.y + b.y};
+}
+
+// A vector pointing against `direction` with the length of `keep`; `keep` itself when there is no
+// direction to align to.
+ParamPoint Opposite(ParamPoint direction, ParamPoint keep) {
+  const double d = Length(direction);
+  if (d == 0.0) {
+    return keep;
+  }
+  const double k = Length(keep);
+  return {-direction.x / d * k, -direction.y / d * k};
+}
+
+bool AreOpposite(ParamPoint a, ParamPoint b) {
+  const double la = Length(a);
+  const double lb = Length(b);
+  if (la == 0.0 || lb == 0.0) {
+    return true;
+  }
+  const double cross = (a.x * b.y - a.y * b.x) / (la * lb);
+  const double dot = a.x * b.x + a.y * b.y;
+  return std::fabs(cross) <= 1e-12 && dot < 0.0;
+}
+
+double Magnitude(const ParamValue& value) {
+  if (const double* d = std::get_if<double>(&value)) {
+    return std::fabs(*d);
+  }
+  if (const ParamPoint* p = std::get_if<ParamPoint>(&value)) {
+    return std::max(std::fabs(p->x), std::fabs(p->y));
+  }
+  return 0.0;  // colours are floats; every finite float is acceptable
+}
+
+double PathDistance(const ParamValue& a, const ParamValue& b) {
+  if (const ParamPoint* p = std::get_if<ParamPoint>(&a)) {
+    return Length(Minus(std::get<ParamPoint>(b), *p));
+  }
+  if (const ParamColor* c = std::get_if<ParamColor>(&a)) {
+    const ParamColor& d = std::get<ParamColor>(b);
+    const double dr = static_cast<double>(d.r) - c->r;
+    const double dg = static_cast<double>(d.g) - c->g;
+    const double db = static_cast<double>(d.b) - c->b;
+    const double da = static_cast<double>(d.a) - c->a;
+    return std::sqrt(dr * dr + dg * dg + db * db + da * da);
+  }
+  return 0.0;
+}
+
+double ScalarOf(const ParamValue& value) {
+  return AsScalar(value).value_or(0.0);
+}
+
+// A continuous keyframe has one speed and opposite tangents. The side that differs from the
+// keyframe it replaces wins; the outgoing side when both or neither do.
+void MakeContinuous(Keyframe& keyframe, const Keyframe* before) {
+  if (keyframe.interpolation == TemporalInterpolation::ContinuousBezier &&
+      keyframe.inSpeed != keyframe.outSpeed) {
+    const bool inChanged = before && keyframe.inSpeed != before->inSpeed;
+    const bool outChanged = before && keyframe.outSpeed != before->outSpeed;
+    if (inChanged && !outChanged) {
+      keyframe.outSpeed = keyframe.inSpeed;
+    } else {
+      keyframe.inSpeed = keyframe.outSpeed;
+    }
+  }
+  if (keyframe.spatial == SpatialInterpolation::ContinuousBezier &&
+      !AreOpposite(keyframe.inTangent, keyframe.outTangent)) {
+    const bool inChanged = before && keyframe.inTangent != before->inTangent;
+    const bool outChanged = before && keyframe.outTangent != before->outTangent;
+    if (inChanged && !outChanged) {
+      keyframe.outTangent = Opposite(keyframe.inTangent, keyframe.outTangent);
+    } else {
+      keyframe.inTangent = Opposite(keyframe.outTangent, keyframe.inTangent);
+    }
+  }
+}
+
+double ClampInfluence(double influence) {
+  return std::clamp(influence, kMinimumInfluence, kMaximumInfluence);
+}
+
+double PolyX(const CurveSegment& g, double u) {
+  return ((g.xa * u + g.xb) * u + g.xc) * u;
+}
+double PolyY(const CurveSegment& g, double u) {
+  return ((g.ya * u + g.yb) * u + g.yc) * u + g.yd;
+}
+double SlopeX(const CurveSegment& g, double u) {
+  return (3.0 * g.xa * u + 2.0 * g.xb) * u + g.xc;
+}
+double SlopeY(const CurveSegment& g, double u) {
+  return (3.0 * g.ya * u + 2.0 * g.yb) * u + g.yc;
+}
+
+// The Bezier parameter u at which the segment reaches normalised time s in [0, 1]. Halley's
+// method from `u` (or from s, a good start because s(u) stays close to u), kept inside a
+// shrinking bracket and falling back to bisection; stops within half a tick (or at double
+// precision for very long segments). s(u) rises strictly, so the answer is unique.
+double SolveForU(const CurveSegment& g, double s, double u) {
+  const double tolerance = std::max(0.5 * g.invSpan, 4e-16);
+  double lo = 0.0;
+  double hi = 1.0;
+  if (!(u >= 0.0 && u <= 1.0)) {
+    u = s;
+  }
+  for (int i = 0; i < 64; ++i) {
+    const double x = PolyX(g, u) - s;
+    if (std::fabs(x) <= tolerance) {
+      return u;
+    }
+    if (x > 0.0) {
+      hi = u;
+    } else {
+      lo = u;
+    }
+    const double d1 = SlopeX(g, u);
+    const double d2 = 6.0 * g.xa * u + 2.0 * g.xb;
+    const double denominator = 2.0 * d1 * d1 - x * d2;
+    double next = denominator != 0.0 ? u - 2.0 * x * d1 / denominator : 0.5 * (lo + hi);
+    if (!(next > lo && next < hi)) {
+      next = 0.5 * (lo + hi);
+    }
+    u = next;
+  }
+  return u;
+}
+
+double NormalisedTime(const CurveSegment& g, TickTime time) {
+  return std::clamp(static_cast<double>(time - g.start) * g.invSpan, 0.0, 1.0);
+}
+
+// Value-units per second at parameter u of a Bezier segment.
+double BezierVelocity(const CurveSegment& g, double u) {
+  return SlopeY(g, u) / SlopeX(g, u) * g.invSpan * kTicksPerSecondD;
+}
+
+}  // namespace
+
+const char* ToString(CurveStatus status) {
+  switch (status) {
+    case CurveStatus::Ok:
+      return "ok";
+    case CurveStatus::DuplicateTime:
+      return "another keyframe is at that time";
+    case CurveStatus::TimeOutOfRange:
+      return "time out of range";
+    case CurveStatus::NonFiniteValue:
+      return "value is not a finite number";
+    case CurveStatus::KindMismatch:
+      return "value kind differs from the curve's";
+    case CurveStatus::NoSuchKeyframe:
+      return "no such keyframe";
+    case CurveStatus::NegativeSpeed:
+      return "speed along a path cannot be negative";
+    case CurveStatus::ValueOutOfRange:
+      return "value out of range";
+    case CurveStatus::InvalidMode:
+      return "no such interpolation";
+  }
+  return "unknown";
+}
+
+// ---------------------------------------------------------------------------------------------
+// Queries
+
+std::optional<ParamValueKind> KeyframeCurve::Kind() const {
+  if (mKeys.empty()) {
+    return std::nullopt;
+  }
+  return KindOf(mKeys.front().value);
+}
+
+namespace {
+
+bool TimeLess(const Keyframe& keyframe, TickTime time) {
+  return keyframe.time < time;
+}
+bool LessTime(TickTime time, const Keyframe& keyframe) {
+  return time < keyframe.time;
+}
+
+}  // namespace
+
+std::optional<std::size_t> KeyframeCurve::FindAt(TickTime time) const {
+  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
+  if (it == mKeys.end() || it->time != time) {
+    return std::nullopt;
+  }
+  return static_cast<std::size_t>(it - mKeys.begin());
+}
+
+std::optional<std::size_t> KeyframeCurve::FindBefore(TickTime time) const {
+  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
+  if (it == mKeys.begin()) {
+    return std::nullopt;
+  }
+  return static_cast<std::size_t>(it - mKeys.begin()) - 1;
+}
+
+std::optional<std::size_t> KeyframeCurve::FindAfter(TickTime time) const {
+  const auto it = std::upper_bound(mKeys.begin(), mKeys.end(), time, LessTime);
+  if (it == mKeys.end()) {
+    return std::nullopt;
+  }
+  return static_cast<std::size_t>(it - mKeys.begin());
+}
+
+std::optional<std::size_t> KeyframeCurve::FindAtOrBefore(TickTime time) const {
+  const auto it = std::upper_bound(mKeys.begin(), mKeys.end(), time, LessTime);
+  if (it == mKeys.begin()) {
+    return std::nullopt;
+  }
+  return static_cast<std::size_t>(it - mKeys.begin()) - 1;
+}
+
+std::optional<std::size_t> KeyframeCurve::FindAtOrAfter(TickTime time) const {
+  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
+  if (it == mKeys.end()) {
+    return std::nullopt;
+  }
+  return static_cast<std::size_t>(it - mKeys.begin());
+}
+
+std::optional<TickTime> KeyframeCurve::NextKeyframeTime(TickTime time) const {
+  const std::optional<std::size_t> index = FindAfter(time);
+  if (!index) {
+    return std::nullopt;
+  }
+  return mKeys[*index].time;
+}
+
+std::optional<TickTime> KeyframeCurve::PreviousKeyframeTime(TickTime time) const {
+  const std::optional<std::size_t> index = FindBefore(time);
+  if (!index) {
+    return std::nullopt;
+  }
+  return mKeys[*index].time;
+}
+
+std::vector<std::size_t> KeyframeCurve::FindInRange(TickTime first, TickTime last) const {
+  std::vector<std::size_t> result;
+  if (last < first) {
+    return result;
+  }
+  auto it = std::lower_bound(mKeys.begin(), mKeys.end(), first, TimeLess);
+  for (; it != mKeys.end() && it->time <= last; ++it) {
+    result.push_back(static_cast<std::size_t>(it - mKeys.begin()));
+  }
+  return result;
+}
+
+// ---------------------------------------------------------------------------------------------
+// Edits
+
+CurveStatus KeyframeCurve::Validate(Keyframe& keyframe, std::optional<std::size_t> ignoring) const {
+  if (!IsStorableTime(keyframe.time)) {
+    return CurveStatus::TimeOutOfRange;
+  }
+  if (!TemporalInterpolationFromCode(static_cast<int>(keyframe.interpolation)) ||
+      !SpatialInterpolationFromCode(static_cast<int>(keyframe.spatial))) {
+    return CurveStatus::InvalidMode;
+  }
+  const double numbers[] = {keyframe.inSpeed,      keyframe.outSpeed,    keyframe.inInfluence,
+                            keyframe.outInfluence, keyframe.inTangent.x, keyframe.inTangent.y,
+                            keyframe.outTangent.x, keyframe.outTangent.y};
+  if (!IsFinite(keyframe.value) || !std::all_of(std::begin(numbers), std::end(numbers),
+                                                [](double n) { return std::isfinite(n); })) {
+    return CurveStatus::NonFiniteValue;
+  }
+  if (Magnitude(keyframe.value) > kMaximumValue ||
+      std::max(std::fabs(keyframe.inSpeed), std::fabs(keyframe.outSpeed)) > kMaximumSpeed ||
+      std::max({std::fabs(keyframe.inTangent.x), std::fabs(keyframe.inTangent.y),
+                std::fabs(keyframe.outTangent.x), std::fabs(keyframe.outTangent.y)}) >
+          kMaximumValue) {
+    return CurveStatus::ValueOutOfRange;
+  }
+  const ParamValueKind kind = KindOf(keyframe.value);
+  const std::size_t others = mKeys.size() - (ignoring ? 1 : 0);
+  if (others > 0 && kind != *Kind()) {
+    return CurveStatus::KindMismatch;
+  }
+  const bool handSet = keyframe.interpolation == TemporalInterpolation::Bezier ||
+                       keyframe.interpolation == TemporalInterpolation::ContinuousBezier;
+  if (IsPathKind(kind) && handSet && (keyframe.inSpeed < 0.0 || keyframe.outSpeed < 0.0)) {
+    return CurveStatus::NegativeSpeed;
+  }
+  keyframe.inInfluence = ClampInfluence(keyframe.inInfluence);
+  keyframe.outInfluence = ClampInfluence(keyframe.outInfluence);
+  if (kind != ParamValueKind::Point) {
+    keyframe.inTangent = {};
+    keyframe.outTangent = {};
+  }
+  return CurveStatus::Ok;
+}
+
+CurveStatus KeyframeCurve::Add(const Keyframe& keyframe) {
+  Keyframe added = keyframe;
+  if (const CurveStatus status = Validate(added, std::nullopt); status != CurveStatus::Ok) {
+    return status;
+  }
+  if (FindAt(added.time)) {
+    return CurveStatus::DuplicateTime;
+  }
+  MakeContinuous(added, nullptr);
+  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), added.time, TimeLess);
+  InsertKey(static_cast<std::size_t>(it - mKeys.begin()), added);
+  Touch();
+  return CurveStatus::Ok;
+}
+
+CurveStatus KeyframeCurve::AddOrReplace(const Keyframe& keyframe) {
+  if (const std::optional<std::size_t> index = FindAt(keyframe.time)) {
+    return Replace(*index, keyframe);
+  }
+  return Add(keyframe);
+}
+
+CurveStatus KeyframeCurve::Replace(std::size_t index, const Keyframe& keyframe) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  Keyframe replacement = keyframe;
+  if (const CurveStatus status = Validate(replacement, index); status != CurveStatus::Ok) {
+    return status;
+  }
+  const std::optional<std::size_t> occupant = FindAt(replacement.time);
+  if (occupant && *occupant != index) {
+    return CurveStatus::DuplicateTime;
+  }
+  MakeContinuous(replacement, &mKeys[index]);
+  const bool staysInPlace = (index == 0 || mKeys[index - 1].time < replacement.time) &&
+                            (index + 1 == mKeys.size() || replacement.time < mKeys[index + 1].time);
+  if (staysInPlace) {
+    mKeys[index] = replacement;
+    Refresh(index, index);
+  } else {
+    EraseKey(index);
+    const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), replacement.time, TimeLess);
+    InsertKey(static_cast<std::size_t>(it - mKeys.begin()), replacement);
+  }
+  Touch();
+  return CurveStatus::Ok;
+}
+
+CurveStatus KeyframeCurve::Remove(std::size_t index) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  EraseKey(index);
+  Touch();
+  return CurveStatus::Ok;
+}
+
+CurveStatus KeyframeCurve::RemoveAt(TickTime time) {
+  const std::optional<std::size_t> index = FindAt(time);
+  return index ? Remove(*index) : CurveStatus::NoSuchKeyframe;
+}
+
+void KeyframeCurve::Clear() {
+  mKeys.clear();
+  mSegments.clear();
+  mPathLengths.clear();
+  mPaths.clear();
+  Touch();
+}
+
+CurveStatus KeyframeCurve::Move(std::size_t index, TickTime newTime) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  Keyframe moved = mKeys[index];
+  moved.time = newTime;
+  return Replace(index, moved);
+}
+
+CurveStatus KeyframeCurve::MoveKeyframes(const std::vector<std::size_t>& indices, TickTime delta) {
+  std::vector<bool> moving(mKeys.size(), false);
+  for (const std::size_t index : indices) {
+    if (index >= mKeys.size()) {
+      return CurveStatus::NoSuchKeyframe;
+    }
+    moving[index] = true;
+  }
+  if (delta == 0 || indices.empty()) {
+    return CurveStatus::Ok;
+  }
+  std::vector<Keyframe> keys = mKeys;
+  for (std::size_t i = 0; i < keys.size(); ++i) {
+    if (!moving[i]) {
+      continue;
+    }
+    TickTime time = 0;
+    if (__builtin_add_overflow(keys[i].time, delta, &time) || !IsStorableTime(time)) {
+      return CurveStatus::TimeOutOfRange;
+    }
+    // Moved keyframes keep their distances, so they can only land on one that stays.
+    const std::optional<std::size_t> occupant = FindAt(time);
+    if (occupant && !moving[*occupant]) {
+      return CurveStatus::DuplicateTime;
+    }
+    keys[i].time = time;
+  }
+  std::stable_sort(keys.begin(), keys.end(),
+                   [](const Keyframe& a, const Keyframe& b) { return a.time < b.time; });
+  mKeys = std::move(keys);
+  RebuildAll();
+  Touch();
+  return CurveStatus::Ok;
+}
+
+CurveStatus KeyframeCurve::SetValue(std::size_t index, const ParamValue& value) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  Keyframe changed = mKeys[index];
+  changed.value = value;
+  return Replace(index, changed);
+}
+
+CurveStatus KeyframeCurve::SetTemporalInterpolation(std::size_t index, TemporalInterpolation mode) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  if (!TemporalInterpolationFromCode(static_cast<int>(mode))) {
+    return CurveStatus::InvalidMode;
+  }
+  Keyframe changed = mKeys[index];
+  if (mode == TemporalInterpolation::ContinuousBezier && changed.interpolation != mode) {
+    const double mean = 0.5 * (changed.inSpeed + changed.outSpeed);
+    changed.inSpeed = mean;
+    changed.outSpeed = mean;
+  }
+  changed.interpolation = mode;
+  return Replace(index, changed);
+}
+
+CurveStatus KeyframeCurve::SetSpatialInterpolation(std::size_t index, SpatialInterpolation mode) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  if (Kind() != ParamValueKind::Point) {
+    return CurveStatus::KindMismatch;
+  }
+  if (!SpatialInterpolationFromCode(static_cast<int>(mode))) {
+    return CurveStatus::InvalidMode;
+  }
+  Keyframe changed = mKeys[index];
+  if (mode == SpatialInterpolation::ContinuousBezier && changed.spatial != mode &&
+      !AreOpposite(changed.inTangent, changed.outTangent)) {
+    changed.inTangent = Opposite(changed.outTangent, changed.inTangent);
+  }
+  changed.spatial = mode;
+  return Replace(index, changed);
+}
+
+CurveStatus KeyframeCurve::SetEase(std::size_t index, KeyframeSide side, double speed,
+                                   double influence) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  Keyframe changed = mKeys[index];
+  if (changed.interpolation != TemporalInterpolation::ContinuousBezier) {
+    changed.interpolation = TemporalInterpolation::Bezier;
+  }
+  const bool continuous = changed.interpolation == TemporalInterpolation::ContinuousBezier;
+  if (side == KeyframeSide::In) {
+    changed.inSpeed = speed;
+    changed.inInfluence = influence;
+    if (continuous) {
+      changed.outSpeed = speed;
+    }
+  } else {
+    changed.outSpeed = speed;
+    changed.outInfluence = influence;
+    if (continuous) {
+      changed.inSpeed = speed;
+    }
+  }
+  return Replace(index, changed);
+}
+
+CurveStatus KeyframeCurve::SetSpatialTangent(std::size_t index, KeyframeSide side,
+                                             ParamPoint tangent) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  if (Kind() != ParamValueKind::Point) {
+    return CurveStatus::KindMismatch;
+  }
+  Keyframe changed = mKeys[index];
+  if (changed.spatial != SpatialInterpolation::ContinuousBezier) {
+    changed.spatial = SpatialInterpolation::Bezier;
+  }
+  ParamPoint& mine = side == KeyframeSide::In ? changed.inTangent : changed.outTangent;
+  ParamPoint& other = side == KeyframeSide::In ? changed.outTangent : changed.inTangent;
+  mine = tangent;
+  if (changed.spatial == SpatialInterpolation::ContinuousBezier) {
+    other = Opposite(tangent, other);
+  }
+  return Replace(index, changed);
+}
+
+CurveStatus KeyframeCurve::ApplyAutomaticEase(std::size_t index, KeyframeSide side) {
+  if (index >= mKeys.size()) {
+    return CurveStatus::NoSuchKeyframe;
+  }
+  Keyframe changed = mKeys[index];
+  changed.interpolation = TemporalInterpolation::Bezier;
+  if (side == KeyframeSide::In) {
+    changed.inSpeed = 0.0;
+    changed.inInfluence = kDefaultInfluence;
+  } else {
+    changed.outSpeed = 0.0;
+    changed.outInfluence = kDefaultInfluence;
+  }
+  return Replace(index, changed);
+}
+
+// ---------------------------------------------------------------------------------------------
+// Derived data
+
+void KeyframeCurve::InsertKey(std::size_t index, const Keyframe& keyframe) {
+  const std::size_t before = mKeys.size();
+  mKeys.insert(mKeys.begin() + static_cast<std::ptrdiff_t>(index), keyframe);
+  if (before == 0) {
+    // The first keyframe sets the kind; nothing derived is left from an earlier kind.
+    mSegments.clear();
+    mPathLengths.clear();
+    mPaths.clear();
+  } else {
+    InsertSlot(std::min(index, before - 1));
+  }
+  Refresh(index, index);
+}
+
+void KeyframeCurve::EraseKey(std::size_t index) {
+  const std::size_t before = mKeys.size();
+  if (before >= 2) {
+    EraseSlot(std::min(index, before - 2));
+  }
+  mKeys.erase(mKeys.begin() + static_cast<std::ptrdiff_t>(index));
+  if (!mKeys.empty()) {
+    Refresh(index > 0 ? index - 1 : 0, std::min(index, mKeys.size() - 1));
+  }
+}
+
+void KeyframeCurve::InsertSlot(std::size_t segment) {
+  const auto at = static_cast<std::ptrdiff_t>(segment);
+  mSegments.insert(mSegments.begin() + at, CurveSegment{});
+  const ParamValueKind kind = *Kind();
+  if (IsPathKind(kind)) {
+    mPathLengths.insert(mPathLengths.begin() + at, 0.0);
+  }
+  if (kind == ParamValueKind::Point) {
+    mPaths.insert(mPaths.begin() + at, CurvePath{});
+  }
+}
+
+void KeyframeCurve::EraseSlot(std::size_t segment) {
+  const auto at = static_cast<std::ptrdiff_t>(segment);
+  mSegments.erase(mSegments.begin() + at);
+  if (!mPathLengths.empty()) {
+    mPathLengths.erase(mPathLengths.begin() + at);
+  }
+  if (!mPaths.empty()) {
+    mPaths.erase(mPaths.begin() + at);
+  }
+}
+
+void KeyframeCurve::RebuildAll() {
+  const std::size_t segments = mKeys.size() < 2 ? 0 : mKeys.size() - 1;
+  const std::optional<ParamValueKind> kind = Kind();
+  mSegments.assign(segments, CurveSegment{});
+  mPathLengths.assign(kind && IsPathKind(*kind) ? segments : 0, 0.0);
+  mPaths.assign(kind == ParamValueKind::Point ? segments : 0, CurvePath{});
+  if (!mKeys.empty()) {
+    Refresh(0, mKeys.size() - 1);
+  }
+}
+
+void KeyframeCurve::Refresh(std::size_t first, std::size_t last) {
+  const std::size_t n = mKeys.size();
+  if (n == 0) {
+    return;
+  }
+  const std::size_t lo = first > kRefreshRadius ? first - kRefreshRadius : 0;
+  const std::size_t hi = std::min(n - 1, last + kRefreshRadius);
+  const ParamValueKind kind = *Kind();
+  if (kind == ParamValueKind::Point) {
+    for (std::size_t k = lo; k <= hi; ++k) {
+      RefreshTangents(k);
+    }
+  }
+  if (n >= 2 && IsPathKind(kind)) {
+    for (std::size_t s = lo; s <= std::min(hi, n - 2); ++s) {
+      RefreshPathLength(s);
+    }
+  }
+  for (std::size_t k = lo; k <= hi; ++k) {
+    RefreshSpeeds(k);
+  }
+  if (n >= 2) {
+    for (std::size_t s = lo; s <= std::min(hi, n - 2); ++s) {
+      RefreshSegment(s);
+    }
+  }
+}
+
+void KeyframeCurve::RefreshTangents(std::size_t index) {
+  Keyframe& key = mKeys[index];
+  switch (key.spatial) {
+    case SpatialInterpolation::Linear:
+      key.inTangent = {};
+      key.outTangent = {};
+      break;
+    case SpatialInterpolation::AutoBezier:
+      if (index > 0 && index + 1 < mKeys.size()) {
+        // Catmull-Rom: the tangent runs parallel to the chord of the neighbours.
+        const ParamPoint chord = Minus(std::get<ParamPoint>(mKeys[index + 1].value),
+                                       std::get<ParamPoint>(mKeys[index - 1].value));
+        key.outTangent = {chord.x / 6.0, chord.y / 6.0};
+        key.inTangent = {-chord.x / 6.0, -chord.y / 6.0};
+      } else {
+        key.inTangent = {};
+        key.outTangent = {};
+      }
+      break;
+    case SpatialInterpolation::Bezier:
+    case SpatialInterpolation::ContinuousBezier:
+      break;
+  }
+}
+
+void KeyframeCurve::RefreshPathLength(std::size_t segment) {
+  const Keyframe& from = mKeys[segment];
+  const Keyframe& to = mKeys[segment + 1];
+  CurveSegment& g = mSegments[segment];
+  g.curvedPath = false;
+  if (const ParamPoint* a = std::get_if<ParamPoint>(&from.value)) {
+    const ParamPoint& b = std::get<ParamPoint>(to.value);
+    if (!IsZero(from.outTangent) || !IsZero(to.inTangent)) {
+      g.curvedPath = true;
+      mPathLengths[segment] =
+          mPaths[segment].Build(*a, Plus(*a, from.outTangent), Plus(b, to.inTangent), b);
+      return;
+    }
+  }
+  mPathLengths[segment] = PathDistance(from.value, to.value);
+}
+
+double KeyframeCurve::SegmentSlope(std::size_t segment) const {
+  const Keyframe& from = mKeys[segment];
+  const Keyframe& to = mKeys[segment + 1];
+  const double seconds = Seconds(static_cast<double>(to.time - from.time));
+  const ParamValueKind kind = KindOf(from.value);
+  if (kind == ParamValueKind::Double) {
+    return (ScalarOf(to.value) - ScalarOf(from.value)) / seconds;
+  }
+  if (IsPathKind(kind)) {
+    return mPathLengths[segment] / seconds;
+  }
+  return 0.0;
+}
+
+void KeyframeCurve::RefreshSpeeds(std::size_t index) {
+  Keyframe& key = mKeys[index];
+  if (key.interpolation == TemporalInterpolation::Bezier ||
+      key.interpolation == TemporalInterpolation::ContinuousBezier) {
+    return;
+  }
+  const std::size_t n = mKeys.size();
+  const bool heldBefore =
+      index > 0 && mKeys[index - 1].interpolation == TemporalInterpolation::Hold;
+  std::optional<double> slopeIn;
+  std::optional<double> slopeOut;
+  if (index > 0 && !heldBefore) {
+    slopeIn = SegmentSlope(index - 1);
+  }
+  if (index + 1 < n) {
+    slopeOut = SegmentSlope(index);
+  }
+  key.inInfluence = kDefaultInfluence;
+  key.outInfluence = kDefaultInfluence;
+  switch (key.interpolation) {
+    case TemporalInterpolation::Hold:
+      key.inSpeed = slopeIn.value_or(0.0);
+      key.outSpeed = 0.0;
+      break;
+    case TemporalInterpolation::Linear:
+      key.inSpeed = slopeIn.value_or(0.0);
+      key.outSpeed = slopeOut.value_or(0.0);
+      break;
+    case TemporalInterpolation::AutoBezier: {
+      double speed = 0.0;
+      if (slopeIn && slopeOut) {
+        const double a = *slopeIn;
+        const double b = *slopeOut;
+        if (IsPathKind(KindOf(key.value))) {
+          speed = 0.5 * (a + b);
+        } else if (a * b > 0.0) {
+          // Parallel to the neighbours' chord, limited so the curve neither overshoots nor turns
+          // back between them (Fritsch-Carlson); flat where the value turns.
+          const double chord =
+              (ScalarOf(mKeys[index + 1].value) - ScalarOf(mKeys[index - 1].value)) /
+              Seconds(static_cast<double>(mKeys[index + 1].time - mKeys[index - 1].time));
+          const double limit = 3.0 * std::min(std::fabs(a), std::fabs(b));
+          speed = std::clamp(chord, -limit, limit);
+        }
+      } else {
+        speed = slopeIn ? *slopeIn : slopeOut.value_or(0.0);
+      }
+      key.inSpeed = speed;
+      key.outSpeed = speed;
+      break;
+    }
+    case TemporalInterpolation::Bezier:
+    case TemporalInterpolation::ContinuousBezier:
+      break;
+  }
+}
+
+void KeyframeCurve::RefreshSegment(std::size_t segment) {
+  const Keyframe& from = mKeys[segment];
+  const Keyframe& to = mKeys[segment + 1];
+  CurveSegment& g = mSegments[segment];
+  const ParamValueKind kind = KindOf(from.value);
+  const bool path = IsPathKind(kind);
+  g.start = from.time;
+  g.end = to.time;
+  g.span = static_cast<double>(to.time - from.time);
+  g.invSpan = 1.0 / g.span;
+  g.y0 = path ? 0.0 : ScalarOf(from.value);
+  g.y3 = path ? mPathLengths[segment] : ScalarOf(to.value);
+  g.x1 = 1.0 / 3.0;
+  g.x2 = 2.0 / 3.0;
+  g.xa = 0.0;
+  g.xb = 0.0;
+  g.xc = 1.0;
+  g.ya = 0.0;
+  g.yb = 0.0;
+  g.yd = g.y0;
+  if (from.interpolation == TemporalInterpolation::Hold || !Interpolates(kind)) {
+    g.shape = CurveSegmentShape::Hold;
+    g.yc = 0.0;
+    return;
+  }
+  const bool straightOut = from.interpolation == TemporalInterpolation::Linear;
+  const bool straightIn = to.interpolation == TemporalInterpolation::Linear ||
+                          to.interpolation == TemporalInterpolation::Hold;
+  if (straightOut && straightIn) {
+    g.shape = CurveSegmentShape::Linear;
+    g.yc = g.y3 - g.y0;
+    return;
+  }
+  g.shape = CurveSegmentShape::Bezier;
+  g.x1 = ClampInfluence(from.outInfluence) * 0.5;
+  g.x2 = 1.0 - ClampInfluence(to.inInfluence) * 0.5;
+  double y1 = g.y0 + Seconds(g.span * g.x1) * from.outSpeed;
+  double y2 = g.y3 - Seconds(g.span * (1.0 - g.x2)) * to.inSpeed;
+  if (path) {
+    // Inside [0, length] the distance never runs back along the path nor beyond its ends.
+    y1 = std::clamp(y1, 0.0, g.y3);
+    y2 = std::clamp(y2, 0.0, g.y3);
+  }
+  g.xc = 3.0 * g.x1;
+  g.xb = 3.0 * (g.x2 - 2.0 * g.x1);
+  g.xa = 1.0 + 3.0 * (g.x1 - g.x2);
+  g.yc = 3.0 * (y1 - g.y0);
+  g.yb = 3.0 * (g.y0 - 2.0 * y1 + y2);
+  g.ya = g.y3 - g.y0 + 3.0 * (y1 - y2);
+}
+
+// ---------------------------------------------------------------------------------------------
+// Evaluation
+
+std::ptrdiff_t KeyframeCurve::SegmentIndexFor(TickTime time, Approach approach) const {
+  const auto n = static_cast<std::ptrdiff_t>(mKeys.size());
+  const auto it = approach == Approach::FromRight
+                      ? std::upper_bound(mKeys.begin(), mKeys.end(), time, LessTime)
+                      : std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
+  const std::ptrdiff_t index = (it - mKeys.begin()) - 1;
+  return std::min(index, n - 1);
+}
+
+ParamValue KeyframeCurve::SegmentValue(std::size_t segment, TickTime time, double* u) const {
+  const CurveSegment& g = mSegments[segment];
+  const Keyframe& from = mKeys[segment];
+  if (g.shape == CurveSegmentShape::Hold || time <= g.start) {
+    return from.value;
+  }
+  const Keyframe& to = mKeys[segment + 1];
+  if (time >= g.end) {
+    return to.value;
+  }
+  const double y = SegmentScalar(segment, time, u);
+  if (KindOf(from.value) == ParamValueKind::Double) {
+    return y;
+  }
+  if (g.curvedPath) {
+    return mPaths[segment].PointAtDistance(y);
+  }
+  const double f = g.y3 > 0.0 ? std::clamp(y / g.y3, 0.0, 1.0) : 0.0;
+  return Blend(from.value, to.value, f);
+}
+
+double KeyframeCurve::SegmentScalar(std::size_t segment, TickTime time, double* u) const {
+  const CurveSegment& g = mSegments[segment];
+  switch (g.shape) {
+    case CurveSegmentShape::Hold:
+      return g.y0;
+    case CurveSegmentShape::Linear:
+      return g.y0 + g.yc * NormalisedTime(g, time);
+    case CurveSegmentShape::Bezier:
+      break;
+  }
+  const double s = NormalisedTime(g, time);
+  *u = SolveForU(g, s, *u);
+  return PolyY(g, *u);
+}
+
+double KeyframeCurve::SegmentVelocity(std::size_t segment, TickTime time, double* u) const {
+  const CurveSegment& g = mSegments[segment];
+  switch (g.shape) {
+    case CurveSegmentShape::Hold:
+      return 0.0;
+    case CurveSegmentShape::Linear:
+      return g.yc * g.invSpan * kTicksPerSecondD;
+    case CurveSegmentShape::Bezier:
+      break;
+  }
+  *u = SolveForU(g, NormalisedTime(g, time), *u);
+  return BezierVelocity(g, *u);
+}
+
+std::optional<ParamValue> KeyframeCurve::ValueAt(TickTime time) const {
+  if (mKeys.empty()) {
+    return std::nullopt;
+  }
+  const std::ptrdiff_t segment = SegmentIndexFor(time, Approach::FromRight);
+  if (segment < 0) {
+    return mKeys.front().value;
+  }
+  if (segment >= static_cast<std::ptrdiff_t>(mKeys.size()) - 1) {
+    return mKeys.back().value;
+  }
+  double u = -1.0;
+  return SegmentValue(static_cast<std::size_t>(segment), time, &u);
+}
+
+std::optional<double> KeyframeCurve::ScalarAt(TickTime time) const {
+  const std::optional<ParamValue> value = ValueAt(time);
+  return value ? AsScalar(*value) : std::nullopt;
+}
+
+double KeyframeCurve::VelocityAt(TickTime time, Approach approach) const {
+  const std::ptrdiff_t segment = SegmentIndexFor(time, approach);
+  if (segment < 0 || segment >= static_cast<std::ptrdiff_t>(mKeys.size()) - 1) {
+    return 0.0;
+  }
+  double u = -1.0;
+  return SegmentVelocity(static_cast<std::size_t>(segment), time, &u);
+}
+
+std::vector<VelocitySample> KeyframeCurve::CreateVelocitySegment(TickTime from, TickTime to,
+                                                                 int count) const {
+  std::vector<VelocitySample> samples;
+  if (count < 2 || !(from < to)) {
+    return samples;
+  }
+  samples.reserve(static_cast<std::size_t>(count));
+  Sampler sampler(*this);
+  const double span = static_cast<double>(to) - static_cast<double>(from);
+  for (int i = 0; i < count; ++i) {
+    TickTime time = to;
+    if (i + 1 < count) {
+      time = from + static_cast<TickTime>(std::floor(span * i / (count - 1)));
+    }
+    const Approach approach = i + 1 == count ? Approach::FromLeft : Approach::FromRight;
+    samples.push_back({time, sampler.VelocityAt(time, approach)});
+  }
+  return samples;
+}
+
+void KeyframeCurve::VelocityExtremes(TickTime from, TickTime to, double* minimum,
+                                     double* maximum) const {
+  bool any = false;
+  auto include = [&](double v) {
+    if (!any) {
+      *minimum = v;
+      *maximum = v;
+      any = true;
+    } else {
+      *minimum = std::min(*minimum, v);
+      *maximum = std::max(*maximum, v);
+    }
+  };
+  *minimum = 0.0;
+  *maximum = 0.0;
+  const std::size_t n = mKeys.size();
+  if (n < 2 || to < from) {
+    return;
+  }
+  if (from == to) {
+    include(VelocityAt(from));
+    return;
+  }
+  if (from < mKeys.front().time || to > mKeys.back().time) {
+    include(0.0);
+  }
+  const std::ptrdiff_t firstSegment =
+      std::max<std::ptrdiff_t>(0, SegmentIndexFor(from, Approach::FromRight));
+  for (auto s = static_cast<std::size_t>(firstSegment); s + 1 < n; ++s) {
+    const CurveSegment& g = mSegments[s];
+    if (g.start >= to) {
+      break;
+    }
+    if (g.end <= from) {
+      continue;
+    }
+    switch (g.shape) {
+      case CurveSegmentShape::Hold:
+        include(0.0);
+        continue;
+      case CurveSegmentShape::Linear:
+        include(g.yc * g.invSpan * kTicksPerSecondD);
+        continue;
+      case CurveSegmentShape::Bezier:
+        break;
+    }
+    const double ua = SolveForU(g, NormalisedTime(g, std::max(from, g.start)), -1.0);
+    const double ub = SolveForU(g, NormalisedTime(g, std::min(to, g.end)), -1.0);
+    include(BezierVelocity(g, ua));
+    include(BezierVelocity(g, ub));
+    // Turning points of y'(u) / x'(u): y''x' - y'x'' = 0 is a quadratic (the cubic terms cancel).
+    const double qa = 6.0 * (g.ya * g.xb - g.yb * g.xa);
+    const double qb = 6.0 * (g.ya * g.xc - g.yc * g.xa);
+    const double qc = 2.0 * (g.yb * g.xc - g.yc * g.xb);
+    double roots[2];
+    int count = 0;
+    const double scale = std::max({std::fabs(qa), std::fabs(qb), std::fabs(qc)});
+    if (scale == 0.0) {
+      // Constant velocity.
+    } else if (std::fabs(qa) <= 1e-12 * scale) {
+      if (qb != 0.0) {
+        roots[count++] = -qc / qb;
+      }
+    } else {
+      const double discriminant = qb * qb - 4.0 * qa * qc;
+      if (discriminant >= 0.0) {
+        const double q = -0.5 * (qb + std::copysign(std::sqrt(discriminant), qb));
+        roots[count++] = q / qa;
+        if (q != 0.0) {
+          roots[count++] = qc / q;
+        }
+      }
+    }
+    for (int i = 0; i < count; ++i) {
+      if (roots[i] > ua && roots[i] < ub) {
+        include(BezierVelocity(g, roots[i]));
+      }
+    }
+  }
+  if (!any) {
+    include(0.0);
+  }
+}
+
+double KeyframeCurve::GetMinimumVelocity(TickTime from, TickTime to) const {
+  double minimum = 0.0;
+  double maximum = 0.0;
+  VelocityExtremes(from, to, &minimum, &maximum);
+  return minimum;
+}
+
+double KeyframeCurve::GetMaximumVelocity(TickTime from, TickTime to) const {
+  double minimum = 0.0;
+  double maximum = 0.0;
+  VelocityExtremes(from, to, &minimum, &maximum);
+  return maximum;
+}
+
+std::optional<KeyframeHandle> KeyframeCurve::ComputeHandle(std::size_t index,
+                                                           KeyframeSide side) const {
+  if (index >= mKeys.size()) {
+    return std::nullopt;
+  }
+  const Keyframe& key = mKeys[index];
+  const bool scalar = AsScalar(key.value).has_value();
+  if (side == KeyframeSide::In) {
+    if (index == 0) {
+      return std::nullopt;
+    }
+    const std::optional<TickTime> time = key.GetEaseInTime(mKeys[index - 1].time);
+    if (!time) {
+      return std::nullopt;
+    }
+    return KeyframeHandle{*time, scalar ? *key.GetEaseInValue(*time) : key.inSpeed};
+  }
+  if (index + 1 >= mKeys.size()) {
+    return std::nullopt;
+  }
+  const std::optional<TickTime> time = key.GetEaseOutTime(mKeys[index + 1].time);
+  if (!time) {
+    return std::nullopt;
+  }
+  return KeyframeHandle{*time, scalar ? *key.GetEaseOutValue(*time) : key.outSpeed};
+}
+
+// ---------------------------------------------------------------------------------------------
+// Sampler
+
+std::ptrdiff_t KeyframeCurve::Sampler::Locate(TickTime time, Approach approach) {
+  const KeyframeCurve& curve = *mCurve;
+  const std::size_t n = curve.mKeys.size();
+  if (mRevision != curve.mRevision) {
+    mRevision = curve.mRevision;
+    mSegment = 0;
+    mLastU = -1.0;
+  }
+  if (n < 2) {
+    return curve.SegmentIndexFor(time, approach);
+  }
+  const std::size_t last = n - 2;
+  mSegment = std::min(mSegment, last);
+  const auto inside = [&](const CurveSegment& g) {
+    return approach == Approach::FromRight ? g.start <= time && time < g.end
+                                           : g.start < time && time <= g.end;
+  };
+  const CurveSegment* segments = curve.mSegments.data();
+  if (inside(segments[mSegment])) {
+    return static_cast<std::ptrdiff_t>(mSegment);
+  }
+  const std::size_t previous = mSegment;
+  const bool later = approach == Approach::FromRight ? time >= segments[mSegment].end
+                                                     : time > segments[mSegment].end;
+  std::ptrdiff_t found = -2;
+  for (int step = 0; step < kCursorSteps; ++step) {
+    if (later ? mSegment == last : mSegment == 0) {
+      break;
+    }
+    mSegment = later ? mSegment + 1 : mSegment - 1;
+    if (inside(segments[mSegment])) {
+      found = static_cast<std::ptrdiff_t>(mSegment);
+      break;
+    }
+  }
+  if (found == -2) {
+    found = curve.SegmentIndexFor(time, approach);
+    mSegment = static_cast<std::size_t>(
+        std::clamp<std::ptrdiff_t>(found, 0, static_cast<std::ptrdiff_t>(last)));
+  }
+  if (mSegment != previous) {
+    mLastU = -1.0;
+  }
+  return found;
+}
+
+std::optional<ParamValue> KeyframeCurve::Sampler::ValueAt(TickTime time) {
+  const KeyframeCurve& curve = *mCurve;
+  if (curve.mKeys.empty()) {
+    return std::nullopt;
+  }
+  const std::ptrdiff_t segment = Locate(time, Approach::FromRight);
+  if (segment < 0) {
+    return curve.mKeys.front().value;
+  }
+  if (segment >= static_cast<std::ptrdiff_t>(curve.mKeys.size()) - 1) {
+    return curve.mKeys.back().value;
+  }
+  return curve.SegmentValue(static_cast<std::size_t>(segment), time, &mLastU);
+}
+
+std::optional<double> KeyframeCurve::Sampler::ScalarAt(TickTime time) {
+  const KeyframeCurve& curve = *mCurve;
+  if (curve.mKeys.empty()) {
+    return std::nullopt;
+  }
+  const std::ptrdiff_t segment = Locate(time, Approach::FromRight);
+  if (segment < 0) {
+    return AsScalar(curve.mKeys.front().value);
+  }
+  if (segment >= static_cast<std::ptrdiff_t>(curve.mKeys.size()) - 1) {
+    return AsScalar(curve.mKeys.back().value);
+  }
+  const ParamValueKind kind = KindOf(curve.mKeys.front().value);
+  if (kind != ParamValueKind::Double && kind != ParamValueKind::Bool &&
+      kind != ParamValueKind::Choice) {
+    return std::nullopt;
+  }
+  return curve.SegmentScalar(static_cast<std::size_t>(segment), time, &mLastU);
+}
+
+double KeyframeCurve::Sampler::VelocityAt(TickTime time, Approach approach) {
+  const KeyframeCurve& curve = *mCurve;
+  const std::ptrdiff_t segment = Locate(time, approach);
+  if (segment < 0 || segment >= static_cast<std::ptrdiff_t>(curve.mKeys.size()) - 1) {
+    return 0.0;
+  }
+  return curve.SegmentVelocity(static_cast<std::size_t>(segment), time, &mLastU);
+}
