@@ -22,6 +22,7 @@ AssertionStore& GetAssertionStore() {
 struct TraceState {
   std::mutex mutex;
   std::set<std::string, std::less<>> enabled;
+  std::set<std::string, std::less<>> disabled;  // exceptions to allEnabled
   bool allEnabled = false;
   bool environmentRead = false;
   TraceSink sink;
@@ -32,33 +33,53 @@ TraceState& GetTraceState() {
   return state;
 }
 
-// Reads EC_TRACE once; the caller holds the lock.
-void ReadTraceEnvironment(TraceState& state) {
-  if (state.environmentRead) {
+// The caller holds the lock.
+void SetEnabled(TraceState& state, std::string_view category, bool enabled) {
+  if (category == "*") {
+    state.allEnabled = enabled;
+    state.disabled.clear();
     return;
   }
-  state.environmentRead = true;
-  const char* const variable = std::getenv("EC_TRACE");
-  if (variable == nullptr) {
-    return;
+  auto& add = enabled ? state.enabled : state.disabled;
+  auto& drop = enabled ? state.disabled : state.enabled;
+  add.emplace(category);
+  if (const auto it = drop.find(category); it != drop.end()) {
+    drop.erase(it);
   }
-  std::string_view rest(variable);
-  while (!rest.empty()) {
-    const auto comma = rest.find(',');
-    std::string_view item = rest.substr(0, comma);
-    rest = comma == std::string_view::npos ? std::string_view() : rest.substr(comma + 1);
+}
+
+// The caller holds the lock.
+void EnableList(TraceState& state, std::string_view list) {
+  while (!list.empty()) {
+    const auto comma = list.find(',');
+    std::string_view item = list.substr(0, comma);
+    list = comma == std::string_view::npos ? std::string_view() : list.substr(comma + 1);
     while (!item.empty() && item.front() == ' ') {
       item.remove_prefix(1);
     }
     while (!item.empty() && item.back() == ' ') {
       item.remove_suffix(1);
     }
-    if (item == "*") {
-      state.allEnabled = true;
-    } else if (!item.empty()) {
-      state.enabled.emplace(item);
+    if (!item.empty()) {
+      SetEnabled(state, item, true);
     }
   }
+}
+
+// Reads EC_TRACE once; the caller holds the lock.
+void ReadTraceEnvironment(TraceState& state) {
+  if (state.environmentRead) {
+    return;
+  }
+  state.environmentRead = true;
+  if (const char* const variable = std::getenv("EC_TRACE")) {
+    EnableList(state, variable);
+  }
+}
+
+// The caller holds the lock.
+bool IsEnabled(const TraceState& state, std::string_view category) {
+  return state.allEnabled ? !state.disabled.contains(category) : state.enabled.contains(category);
 }
 
 // Index of the '(' matching the ')' at `close`, or npos.
@@ -183,7 +204,7 @@ void Trace(std::string_view category, std::string_view text) {
   {
     const std::lock_guard lock(state.mutex);
     ReadTraceEnvironment(state);
-    if (!state.allEnabled && !state.enabled.contains(category)) {
+    if (!IsEnabled(state, category)) {
       return;
     }
     sink = state.sink;
@@ -199,18 +220,21 @@ void SetTraceCategoryEnabled(std::string_view category, bool enabled) {
   auto& state = GetTraceState();
   const std::lock_guard lock(state.mutex);
   ReadTraceEnvironment(state);
-  if (enabled) {
-    state.enabled.emplace(category);
-  } else if (const auto it = state.enabled.find(category); it != state.enabled.end()) {
-    state.enabled.erase(it);
-  }
+  SetEnabled(state, category, enabled);
+}
+
+void EnableTraceCategories(std::string_view list) {
+  auto& state = GetTraceState();
+  const std::lock_guard lock(state.mutex);
+  ReadTraceEnvironment(state);
+  EnableList(state, list);
 }
 
 bool IsTraceCategoryEnabled(std::string_view category) {
   auto& state = GetTraceState();
   const std::lock_guard lock(state.mutex);
   ReadTraceEnvironment(state);
-  return state.allEnabled || state.enabled.contains(category);
+  return IsEnabled(state, category);
 }
 
 void SetTraceSink(TraceSink sink) {
@@ -223,6 +247,7 @@ void ResetTraceForTesting() {
   auto& state = GetTraceState();
   const std::lock_guard lock(state.mutex);
   state.enabled.clear();
+  state.disabled.clear();
   state.allEnabled = false;
   state.environmentRead = true;
   state.sink = nullptr;

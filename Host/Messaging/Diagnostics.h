@@ -66,13 +66,16 @@ P& RequireInterface(P* p, std::string_view name) {
 void ReportNullInterface(const NullInterfaceException& exception, std::string_view where);
 
 // Trace lines by category (e.g. Trace("Tracker", ...)). A category is off until enabled, either
-// here or by the environment variable EC_TRACE (comma-separated categories, or "*" for all),
-// read on first use. Lines go to stderr as "[category] text", or to the sink when one is set.
-// Thread-safe; the sink is called outside any lock and may trace again.
+// here or by the environment variable EC_TRACE (a list as for EnableTraceCategories), read on
+// first use. The category "*" stands for all; with it on, single categories can still be off. Lines
+// go to stderr as "[category] text", or to the sink when one is set. Thread-safe; the sink is
+// called outside any lock and may trace again.
 using TraceSink = std::function<void(std::string_view category, std::string_view text)>;
 void Trace(std::string_view category, std::string_view text);
 void SetTraceCategoryEnabled(std::string_view category, bool enabled);
 bool IsTraceCategoryEnabled(std::string_view category);
+// Enables each category of a comma-separated list such as "Tracker, Layout" or "*".
+void EnableTraceCategories(std::string_view list);
 // An empty sink restores stderr.
 void SetTraceSink(TraceSink sink);
 // Disables every category, ignores EC_TRACE, restores stderr (tests).

@@ -9,7 +9,9 @@ class StationCore;
 // Receives the messages broadcast on the stations it was added to (see Station.h).
 // Listening is tied to the object's lifetime: the destructor stops listening on every station,
 // and that is safe even while one of those stations is delivering to this very listener.
-// UI thread only.
+// A derived class whose destructor could cause a broadcast to itself (it disposes an object it
+// listens to, say) calls RemoveListenerFromAllStations first: by the time ~Listener runs, the
+// derived ListenToMessage is gone. UI thread only.
 class Listener {
  public:
   Listener();

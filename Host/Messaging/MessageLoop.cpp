@@ -83,16 +83,35 @@ void MessageLoop::AddIdleTask(std::function<void()> task) {
   if (!task) {
     return;
   }
-  const std::lock_guard lock(mMutex);
-  mIdleTasks.push_back(std::move(task));
+  std::function<void()> wakeUp;
+  {
+    const std::lock_guard lock(mMutex);
+    mIdleTasks.push_back(std::move(task));
+    wakeUp = mWakeUp;
+  }
+  if (wakeUp) {
+    wakeUp();
+  }
 }
 
 void MessageLoop::Post(const StationName& station, std::shared_ptr<const Message> message) {
   if (!HOST_VERIFY(message != nullptr, "Posting a null message")) {
     return;
   }
+  std::function<void()> wakeUp;
+  {
+    const std::lock_guard lock(mMutex);
+    mPosts.push_back({station, std::move(message)});
+    wakeUp = mWakeUp;
+  }
+  if (wakeUp) {
+    wakeUp();
+  }
+}
+
+void MessageLoop::SetWakeUpHandler(std::function<void()> handler) {
   const std::lock_guard lock(mMutex);
-  mPosts.push_back({station, std::move(message)});
+  mWakeUp = std::move(handler);
 }
 
 void MessageLoop::DiscardPending() {
@@ -102,6 +121,7 @@ void MessageLoop::DiscardPending() {
     const std::lock_guard lock(mMutex);
     posts.swap(mPosts);
     tasks.swap(mIdleTasks);
+    mWakeUp = nullptr;
   }
   // Destroyed outside the lock: a message's or task's destructor may post.
 }

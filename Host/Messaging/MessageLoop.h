@@ -32,7 +32,11 @@ class MessageLoop {
   // Thread-safe; see PostMessageToUIThread.
   void Post(const StationName& station, std::shared_ptr<const Message> message);
 
-  // Drops every queued post and task (tests; see MessagingTestScope).
+  // Called after each post and idle task is queued, on the queuing thread and outside the lock,
+  // so a front end can wake its event loop (an SDL user event, say). Empty: none.
+  void SetWakeUpHandler(std::function<void()> handler);
+
+  // Drops every queued post and task and the wake-up handler (tests; see MessagingTestScope).
   void DiscardPending();
 
  private:
@@ -46,5 +50,6 @@ class MessageLoop {
   mutable std::mutex mMutex;
   std::deque<QueuedPost> mPosts;                  // guarded by mMutex
   std::vector<std::function<void()>> mIdleTasks;  // guarded by mMutex
+  std::function<void()> mWakeUp;                  // guarded by mMutex
   bool mRunning = false;                          // UI thread only
 };

@@ -1,5 +1,6 @@
 #include "Host/Messaging/Preferences.h"
 
+#include <fcntl.h>
 #include <unistd.h>
 
 #include <cerrno>
@@ -69,6 +70,15 @@ bool WriteFileDurably(const fs::path& path, const std::string& contents, std::st
     return false;
   }
   return true;
+}
+
+// Makes a finished rename survive a power cut; failure only costs that guarantee.
+void SyncDirectory(const fs::path& directory) {
+  const int fd = ::open(directory.empty() ? "." : directory.c_str(), O_RDONLY | O_DIRECTORY);
+  if (fd >= 0) {
+    ::fsync(fd);
+    ::close(fd);
+  }
 }
 
 }  // namespace
@@ -175,25 +185,35 @@ bool Preferences::Save(std::string* error) const {
     return fail("not saved: " + mSaveBlockedReason);
   }
   std::error_code ec;
-  if (mFile.has_parent_path()) {
-    fs::create_directories(mFile.parent_path(), ec);
+  // A symbolic link (dotfiles kept elsewhere) stays a link: the file it points to is replaced.
+  fs::path target = mFile;
+  if (fs::is_symlink(mFile, ec)) {
+    const fs::path resolved = fs::weakly_canonical(mFile, ec);
     if (ec) {
-      return fail("cannot create " + mFile.parent_path().string() + ": " + ec.message());
+      return fail("cannot resolve " + mFile.string() + ": " + ec.message());
+    }
+    target = resolved;
+  }
+  if (target.has_parent_path()) {
+    fs::create_directories(target.parent_path(), ec);
+    if (ec) {
+      return fail("cannot create " + target.parent_path().string() + ": " + ec.message());
     }
   }
-  fs::path temporary = mFile;
+  fs::path temporary = target;
   temporary += ".tmp." + std::to_string(::getpid());
   std::string why;
   if (!WriteFileDurably(temporary, mProperties.ToJSON() + "\n", why)) {
     fs::remove(temporary, ec);
     return fail(why);
   }
-  fs::rename(temporary, mFile, ec);
+  fs::rename(temporary, target, ec);
   if (ec) {
     const std::string message = ec.message();
     fs::remove(temporary, ec);
-    return fail("cannot replace " + mFile.string() + ": " + message);
+    return fail("cannot replace " + target.string() + ": " + message);
   }
+  SyncDirectory(target.parent_path());
   return true;
 }
 

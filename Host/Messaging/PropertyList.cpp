@@ -1,6 +1,7 @@
 #include "Host/Messaging/PropertyList.h"
 
 #include <cmath>
+#include <cstdint>
 #include <limits>
 #include <nlohmann/json.hpp>
 
@@ -8,7 +9,56 @@ namespace {
 
 using Json = nlohmann::json;
 
-bool IsFiniteNumber(const PropertyList::Value& value) {
+// Well-formed UTF-8 (no overlong forms, surrogates or code points above U+10FFFF): only such text
+// survives a save, so nothing else is accepted.
+bool IsValidUtf8(std::string_view text) {
+  std::size_t i = 0;
+  while (i < text.size()) {
+    const auto byte = static_cast<unsigned char>(text[i]);
+    std::size_t length = 0;
+    std::uint32_t codePoint = 0;
+    if (byte < 0x80) {
+      ++i;
+      continue;
+    } else if ((byte & 0xE0) == 0xC0) {
+      length = 2;
+      codePoint = byte & 0x1F;
+    } else if ((byte & 0xF0) == 0xE0) {
+      length = 3;
+      codePoint = byte & 0x0F;
+    } else if ((byte & 0xF8) == 0xF0) {
+      length = 4;
+      codePoint = byte & 0x07;
+    } else {
+      return false;
+    }
+    if (i + length > text.size()) {
+      return false;
+    }
+    for (std::size_t k = 1; k < length; ++k) {
+      const auto next = static_cast<unsigned char>(text[i + k]);
+      if ((next & 0xC0) != 0x80) {
+        return false;
+      }
+      codePoint = (codePoint << 6) | (next & 0x3F);
+    }
+    constexpr std::uint32_t kSmallest[] = {0, 0, 0x80, 0x800, 0x10000};
+    if (codePoint < kSmallest[length] || codePoint > 0x10FFFF ||
+        (codePoint >= 0xD800 && codePoint <= 0xDFFF)) {
+      return false;
+    }
+    i += length;
+  }
+  return true;
+}
+
+bool IsStorable(std::string_view key, const PropertyList::Value& value) {
+  if (key.empty() || !IsValidUtf8(key)) {
+    return false;
+  }
+  if (const auto* text = std::get_if<std::string>(&value)) {
+    return IsValidUtf8(*text);
+  }
   if (const auto* f = std::get_if<float>(&value)) {
     return std::isfinite(*f);
   }
@@ -131,7 +181,7 @@ std::string PropertyList::GetString(std::string_view key, std::string_view defau
 }
 
 bool PropertyList::SetValue(std::string_view key, Value value) {
-  if (key.empty() || IsReadOnly(key) || !IsFiniteNumber(value)) {
+  if (IsReadOnly(key) || !IsStorable(key, value)) {
     return false;
   }
   const auto it = mValues.find(key);
@@ -210,7 +260,7 @@ std::string PropertyList::ToJSON() const {
   Json document = Json::object();
   document["values"] = std::move(values);
   document["readOnly"] = std::move(readOnly);
-  // Invalid UTF-8 in a key or string is replaced rather than failing the whole save.
+  // Setters admit only valid UTF-8; replacing is a safety net that cannot fail the save.
   return document.dump(2, ' ', false, Json::error_handler_t::replace);
 }
 
@@ -238,7 +288,7 @@ std::optional<PropertyList> PropertyList::FromJSON(std::string_view text, std::s
       if (key.empty()) {
         return fail("a value has an empty key");
       }
-      if (!value || !IsFiniteNumber(*value)) {
+      if (!value || !IsStorable(key, *value)) {
         return fail("the value of \"" + key + "\" is not a bool, number or string");
       }
       list.mValues.emplace(key, std::move(*value));

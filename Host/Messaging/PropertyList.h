@@ -22,7 +22,8 @@
 // int), never to or from bool or string.
 //
 // Writing fails visibly: every setter returns false and changes nothing when the key is
-// read-only, the key is empty, or the number is not finite (it could not be saved).
+// read-only, the key is empty, or the value could not be saved (a number that is not finite,
+// text or a key that is not valid UTF-8).
 class PropertyList {
  public:
   using Value = std::variant<bool, int, float, double, std::string>;

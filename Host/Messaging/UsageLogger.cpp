@@ -69,8 +69,8 @@ std::shared_ptr<UsageLogSink> UsageLogger::GetSink() const {
 }
 
 void UsageLogger::LogEvent(std::string_view name, std::initializer_list<UsageField> fields) {
-  const std::lock_guard lock(mMutex);
-  if (mSink == nullptr) {
+  const auto sink = GetSink();
+  if (sink == nullptr) {
     return;
   }
   UsageEvent event{std::string(name), {}};
@@ -78,5 +78,5 @@ void UsageLogger::LogEvent(std::string_view name, std::initializer_list<UsageFie
   for (const auto& field : fields) {
     event.fields.emplace_back(field.key, field.value);
   }
-  mSink->Record(event);
+  sink->Record(event);
 }

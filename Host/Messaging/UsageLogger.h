@@ -38,7 +38,8 @@ struct UsageEvent {
   std::string Get(std::string_view key) const;
 };
 
-// Where usage events go. Called on the thread that logs, under the logger's lock.
+// Where usage events go. Called on the thread that logs, outside the logger's lock (a sink may
+// log again); a sink used from several threads guards itself.
 class UsageLogSink {
  public:
   virtual ~UsageLogSink() = default;

@@ -150,6 +150,29 @@ TEST_F(DiagnosticsTest, TraceGoesOutOnlyForEnabledCategories) {
   EXPECT_EQ(lines, (std::vector<std::string>{"Tracker|tracked 48 frames in 812 ms"}));
 }
 
+TEST_F(DiagnosticsTest, AllCategoriesCanBeOnWithExceptions) {
+  std::vector<std::string> lines;
+  SetTraceSink([&](std::string_view category, std::string_view) { lines.emplace_back(category); });
+  SetTraceCategoryEnabled("*", true);
+  SetTraceCategoryEnabled("Noisy", false);
+  Trace("Tracker", "");
+  Trace("Noisy", "");
+  Trace("Layout", "");
+  SetTraceCategoryEnabled("*", false);
+  Trace("Tracker", "");
+  EXPECT_EQ(lines, (std::vector<std::string>{"Tracker", "Layout"}));
+}
+
+TEST_F(DiagnosticsTest, CategoryListsAsInTheEnvironment) {
+  EnableTraceCategories(" Tracker,Layout ,,");
+  EXPECT_TRUE(IsTraceCategoryEnabled("Tracker"));
+  EXPECT_TRUE(IsTraceCategoryEnabled("Layout"));
+  EXPECT_FALSE(IsTraceCategoryEnabled("Other"));
+  EXPECT_FALSE(IsTraceCategoryEnabled(""));
+  EnableTraceCategories("*");
+  EXPECT_TRUE(IsTraceCategoryEnabled("Other"));
+}
+
 TEST_F(DiagnosticsTest, TraceWithoutASinkWritesTheCategoryToStderr) {
   SetTraceCategoryEnabled("Tracker", true);
   testing::internal::CaptureStderr();
@@ -191,6 +214,23 @@ TEST_F(DiagnosticsTest, UsageEventsReachTheSinkWithTheirFieldsInOrder) {
   EXPECT_EQ(events[0].Get("frames"), "48");
   EXPECT_EQ(events[0].Get("missing"), "");
   EXPECT_EQ(mScope.UsageEvents().Count("mask_tracker_performance"), 1u);
+}
+
+TEST_F(DiagnosticsTest, AUsageSinkMayLogAgain) {
+  class ForwardingSink : public UsageLogSink {
+   public:
+    void Record(const UsageEvent& event) override {
+      names.push_back(event.name);
+      if (event.name == "outer") {
+        UsageLogger::Instance().LogEvent("inner");
+      }
+    }
+    std::vector<std::string> names;
+  };
+  const auto sink = std::make_shared<ForwardingSink>();
+  UsageLogger::Instance().SetSink(sink);
+  UsageLogger::Instance().LogEvent("outer", {{"n", 1}});
+  EXPECT_EQ(sink->names, (std::vector<std::string>{"outer", "inner"}));
 }
 
 TEST_F(DiagnosticsTest, UsageEventsWithoutASinkAreDropped) {

@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <atomic>
 #include <memory>
 #include <string>
 #include <thread>
@@ -167,6 +168,18 @@ TEST_F(MessageLoopTest, PostsFromOtherThreadsAllArriveInEachThreadsOrder) {
       EXPECT_EQ(values[static_cast<std::size_t>(i)], i);
     }
   }
+}
+
+TEST_F(MessageLoopTest, EveryPostAndTaskWakesTheFrontEnd) {
+  std::atomic<int> wakeUps = 0;
+  Loop().SetWakeUpHandler([&] { ++wakeUps; });
+  PostMessageToUIThread("S", std::make_shared<PingMessage>(1));
+  std::thread([] { PostMessageToUIThread("S", std::make_shared<PingMessage>(2)); }).join();
+  Loop().AddIdleTask([] {});
+  EXPECT_EQ(wakeUps, 3);
+  Loop().SetWakeUpHandler(nullptr);
+  PostMessageToUIThread("S", std::make_shared<PingMessage>(3));
+  EXPECT_EQ(wakeUps, 3);
 }
 
 TEST_F(MessageLoopTest, DiscardPendingDropsPostsAndTasks) {

@@ -9,6 +9,8 @@
 #include <optional>
 #include <string>
 
+#include "Host/Messaging/FunctionListener.h"
+#include "Host/Messaging/MessageLoop.h"
 #include "Host/Messaging/MessagingTestScope.h"
 #include "Host/Messaging/Preferences.h"
 
@@ -219,6 +221,26 @@ TEST_F(PreferencesTest, SaveFailureIsReportedNotHidden) {
   EXPECT_EQ(ReadFile(mDirectory / "effectcontrols"), "a file, not a directory");
 }
 
+TEST_F(PreferencesTest, ASymbolicLinkStaysALinkToTheSavedFile) {
+  const fs::path dotfiles = mDirectory / "dotfiles" / "effectcontrols.json";
+  fs::create_directories(dotfiles.parent_path());
+  fs::create_directories(mFile.parent_path());
+  Preferences first(dotfiles);
+  first.SetInt("n", 1);
+  ASSERT_TRUE(first.Save());
+  fs::create_symlink(dotfiles, mFile);
+
+  Preferences preferences(mFile);
+  EXPECT_EQ(preferences.Load().status, Preferences::LoadStatus::kLoaded);
+  EXPECT_EQ(preferences.GetInt("n", 0), 1);
+  preferences.SetInt("n", 2);
+  ASSERT_TRUE(preferences.Save());
+  EXPECT_TRUE(fs::is_symlink(mFile));
+  Preferences direct(dotfiles);
+  direct.Load();
+  EXPECT_EQ(direct.GetInt("n", 0), 2);
+}
+
 TEST_F(PreferencesTest, ReadOnlyPreferenceRefusesWrites) {
   Preferences preferences(mFile);
   preferences.SetBool("be.prefs.effectcontrols.showtimerulernumbers", true);
@@ -260,6 +282,26 @@ TEST_F(PreferencesTest, ApplicationPreferencesAreInMemoryUnderTestAndCanBeInstal
   Preferences::Application().SetInt("n", 3);
   ASSERT_TRUE(Preferences::Application().Save());
   EXPECT_TRUE(fs::exists(mFile));
+}
+
+TEST_F(PreferencesTest, AWriterThatFindsAReadOnlyKeyCanWarnOnThePreferencesStation) {
+  std::vector<std::string> warned;
+  FunctionListener listener([&](const Message& message) {
+    if (const auto* warning = message.As<OverrideReadOnlyPropertyWarningMessage>()) {
+      warned.push_back(warning->key);
+    }
+  });
+  auto& preferences = Preferences::Application();
+  AddListener(preferences.Properties().GetStation(), listener);
+  preferences.Properties().SetReadOnly("be.prefs.effectcontrols.showtimerulernumbers", true);
+  if (!preferences.SetBool("be.prefs.effectcontrols.showtimerulernumbers", false)) {
+    PostMessageToUIThread(preferences.Properties().GetStation(),
+                          std::make_shared<OverrideReadOnlyPropertyWarningMessage>(
+                              "be.prefs.effectcontrols.showtimerulernumbers"));
+  }
+  EXPECT_TRUE(warned.empty());
+  MessageLoop::Instance().RunPending();
+  EXPECT_EQ(warned, (std::vector<std::string>{"be.prefs.effectcontrols.showtimerulernumbers"}));
 }
 
 TEST(PreferencesScope, TestScopeResetsApplicationPreferences) {

@@ -98,6 +98,20 @@ TEST(PropertyList, RejectsEmptyKeysAndNumbersThatCannotBeSaved) {
   EXPECT_EQ(list.GetDouble("kept", 0), 1.0);
 }
 
+TEST(PropertyList, RejectsTextThatIsNotValidUtf8) {
+  PropertyList list;
+  EXPECT_FALSE(list.SetString("name", "caf\xe9"));       // Latin-1
+  EXPECT_FALSE(list.SetString("name", "\xc0\xaf"));      // overlong '/'
+  EXPECT_FALSE(list.SetString("name", "\xed\xa0\x80"));  // surrogate
+  EXPECT_FALSE(list.SetString("name", "\xe2\x82"));      // cut short
+  EXPECT_FALSE(list.SetInt("k\xff", 1));
+  EXPECT_TRUE(list.Empty());
+  EXPECT_TRUE(list.SetString("name", "caf\xc3\xa9 \xf0\x9f\x8e\xac"));
+  const auto restored = PropertyList::FromJSON(list.ToJSON());
+  ASSERT_TRUE(restored);
+  EXPECT_EQ(restored->GetString("name", ""), "caf\xc3\xa9 \xf0\x9f\x8e\xac");
+}
+
 TEST(PropertyList, RemoveAndClear) {
   PropertyList list;
   list.SetBool("ECP.Graphics.Expanded", true);

@@ -203,10 +203,25 @@ TEST_F(StationTest, ListenerRemovedAndAddedAgainDuringBroadcastIsNotCalledTwice)
   EXPECT_EQ(mLog, (Log{"a:1", "a:2", "b:2"}));
 }
 
+namespace {
+
+class SelfDestroyingListener : public Listener {
+ public:
+  explicit SelfDestroyingListener(Log& log) : mLog(log) {}
+  void ListenToMessage(const Message& message) override {
+    mLog.push_back("self:" + std::to_string(message.As<PingMessage>()->value));
+    delete this;
+  }
+
+ private:
+  Log& mLog;  // owned by the test
+};
+
+}  // namespace
+
 TEST_F(StationTest, ListenerDestroyingItselfDuringBroadcast) {
   LoggingListener a("a", mLog), c("c", mLog);
-  auto* self = new LoggingListener("self", mLog);
-  self->SetAction([self](const Message&) { delete self; });
+  auto* self = new SelfDestroyingListener(mLog);
   AddListener("S", a);
   AddListener("S", *self);
   AddListener("S", c);
