@@ -1,0 +1,14 @@
+#pragma once
+
+#include "Host/Toolkit/CommandStatus.h"
+
+// The host's standard edit commands. The shortcut manager declares them, with their names and
+// keys, in its global context; views answer them through their commanders.
+inline constexpr CommandID kCommandClear = 57632;        // "cmd.edit.clear": Delete, Backspace
+inline constexpr CommandID kCommandCopy = 57634;         // "cmd.edit.copy": Ctrl+C
+inline constexpr CommandID kCommandCut = 57635;          // "cmd.edit.cut": Ctrl+X
+inline constexpr CommandID kCommandPaste = 57637;        // "cmd.edit.paste": Ctrl+V
+inline constexpr CommandID kCommandSelectAll = 57642;    // "cmd.edit.selectall": Ctrl+A
+inline constexpr CommandID kCommandUndo = 57643;         // "cmd.edit.undo": Ctrl+Z
+inline constexpr CommandID kCommandRedo = 57644;         // "cmd.edit.redo": Ctrl+Shift+Z
+inline constexpr CommandID kCommandDeselectAll = 11303;  // "cmd.edit.deselectall": Ctrl+Shift+A
