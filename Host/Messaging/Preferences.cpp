@@ -133,18 +133,27 @@ Preferences::LoadResult Preferences::Load() {
     return result;
   }
   std::string text;
-  bool readable = !ec && fs::is_regular_file(status);
-  if (readable) {
+  std::string unreadable;
+  if (ec) {
+    unreadable = ec.message();
+  } else if (!fs::is_regular_file(status)) {
+    unreadable = "not a regular file";
+  } else {
     std::ifstream in(mFile, std::ios::binary);
-    text.assign(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
-    readable = in.is_open() && !in.bad();
+    if (!in.is_open()) {
+      unreadable = std::strerror(errno);
+    } else {
+      text.assign(std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>());
+      if (in.bad()) {
+        unreadable = "read error";
+      }
+    }
   }
-  if (!readable) {
+  if (!unreadable.empty()) {
     result.status = LoadStatus::kUnreadable;
-    result.error = "cannot read " + mFile.string();
+    result.error = "cannot read " + mFile.string() + ": " + unreadable;
     mSaveBlockedReason = result.error;
-    std::cerr << "Preferences: " << result.error << "; using defaults and not saving over it"
-              << std::endl;
+    ReportOnce(result.error + "; using defaults and not saving over it");
     return result;
   }
 
@@ -161,13 +170,18 @@ Preferences::LoadResult Preferences::Load() {
   result.keptAside = KeepAside(mFile);
   if (result.keptAside.empty()) {
     mSaveBlockedReason = result.error + " and could not be moved aside";
-    std::cerr << "Preferences: " << mSaveBlockedReason << "; using defaults and not saving over it"
-              << std::endl;
+    ReportOnce(mSaveBlockedReason + "; using defaults and not saving over it");
   } else {
-    std::cerr << "Preferences: " << result.error << "; kept as " << result.keptAside.string()
-              << ", using defaults" << std::endl;
+    ReportOnce(result.error + "; kept as " + result.keptAside.string() + ", using defaults");
   }
   return result;
+}
+
+void Preferences::ReportOnce(const std::string& problem) {
+  if (problem != mLastReported) {
+    mLastReported = problem;
+    std::cerr << "Preferences: " << problem << std::endl;
+  }
 }
 
 bool Preferences::Save(std::string* error) const {

@@ -74,5 +74,9 @@ class Preferences {
  private:
   std::filesystem::path mFile;
   PropertyList mProperties;
+  // Writes a load problem to stderr unless it is the one reported last.
+  void ReportOnce(const std::string& problem);
+
   std::string mSaveBlockedReason;  // non-empty: the file on disk must not be overwritten
+  std::string mLastReported;
 };

@@ -180,6 +180,29 @@ TEST_F(PreferencesTest, ASecondCorruptFileDoesNotOverwriteTheFirstKeptCopy) {
   EXPECT_EQ(ReadFile(mFile.string() + ".corrupt.2"), "second");
 }
 
+TEST_F(PreferencesTest, ACorruptFileThatCannotBeMovedAsideIsNeverWrittenOver) {
+  // A name of the longest length allowed leaves no room for the ".corrupt" suffix.
+  const fs::path file = mDirectory / (std::string(250, 'p') + ".json");
+  fs::create_directories(mDirectory);
+  WriteFile(file, "{corrupt");
+  Preferences preferences(file);
+  testing::internal::CaptureStderr();
+  const auto result = preferences.Load();
+  preferences.Load();
+  preferences.SetInt("n", 1);
+  std::string error;
+  const bool saved = preferences.Save(&error);
+  const std::string shown = testing::internal::GetCapturedStderr();
+
+  EXPECT_EQ(result.status, Preferences::LoadStatus::kCorrupt);
+  EXPECT_TRUE(result.keptAside.empty());
+  EXPECT_FALSE(saved);
+  EXPECT_THAT(error, testing::HasSubstr("could not be moved aside"));
+  EXPECT_EQ(ReadFile(file), "{corrupt");
+  // One line for the two loads, one for the refused save.
+  EXPECT_EQ(std::count(shown.begin(), shown.end(), '\n'), 2) << shown;
+}
+
 TEST_F(PreferencesTest, EmptyOrWronglyShapedFilesAreCorrupt) {
   fs::create_directories(mFile.parent_path());
   for (const char* text : {"", "[1, 2]", R"({"values": {"a": null}})", "\xff\xfe"}) {
