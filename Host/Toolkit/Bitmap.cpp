@@ -6,9 +6,9 @@
 #include <array>
 #include <cmath>
 
+#include "Host/Messaging/Diagnostics.h"
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/DecalPainter.h"
-#include "Host/Toolkit/DrawingDiagnostics.h"
 
 namespace {
 
@@ -29,7 +29,7 @@ Bitmap::~Bitmap() = default;
 
 std::shared_ptr<const Bitmap> Bitmap::GetBitmap(Decal decal) {
   static std::array<std::shared_ptr<const Bitmap>, kDecalCount> bitmaps;
-  if (!DRAWING_VERIFY(decal >= 0 && decal < kDecalCount, "Unknown decal")) {
+  if (!HOST_VERIFY(decal >= 0 && decal < kDecalCount, "Unknown decal")) {
     static const std::shared_ptr<const Bitmap> placeholder = [] {
       Image image(Size{16, 16});
       image.Clear(ColorManager::kFallbackColor);

@@ -6,7 +6,7 @@
 #include <set>
 #include <unordered_map>
 
-#include "Host/Toolkit/DrawingDiagnostics.h"
+#include "Host/Messaging/Diagnostics.h"
 
 namespace {
 
@@ -167,7 +167,7 @@ class ColorState {
     reported.emplace_back(key);
     const std::string message =
         "Unknown colour key or unresolvable colour '" + std::string(key) + "'";
-    ReportDrawingProblem(message, "ColorManager::HasColor(key)", __FILE__, __LINE__,
+    ReportDebugAssertion(message, "ColorManager::HasColor(key)", __FILE__, __LINE__,
                          "ColorManager::GetColor");
   }
 
@@ -212,7 +212,7 @@ std::vector<ColorDefinitionProblem> ColorManager::RegisterColorSet(const std::st
   std::sort(parsed.problems.begin(), parsed.problems.end(),
             [](const auto& a, const auto& b) { return a.line < b.line; });
   for (const ColorDefinitionProblem& problem : parsed.problems) {
-    ReportDrawingProblem(
+    ReportDebugAssertion(
         "Colour set '" + name + "' line " + std::to_string(problem.line) + ": " + problem.reason,
         "well-formed colour definition", __FILE__, __LINE__, "ColorManager::RegisterColorSet");
   }

@@ -9,8 +9,8 @@
 #include <limits>
 #include <numbers>
 
+#include "Host/Messaging/Diagnostics.h"
 #include "Host/Toolkit/Bitmap.h"
-#include "Host/Toolkit/DrawingDiagnostics.h"
 #include "Host/Toolkit/Font.h"
 #include "Host/Toolkit/Image.h"
 #include "Host/Toolkit/ImageList.h"
@@ -125,8 +125,25 @@ std::vector<PointD> ClipPolygon(std::vector<PointD> points, double left, double 
   return points;
 }
 
-// Points on the circle's arc that can lie inside `box` (the centre is far away, the radius
-// huge): the angular span of the box seen from the centre, finely sampled.
+enum class BoxAndCircle { kOutside, kInside, kCrossing };
+
+// Where the box lies relative to the disc of radius r around c.
+BoxAndCircle CircleMeetsBox(PointD c, double r, double left, double top, double right,
+                            double bottom) {
+  const double nearX = std::clamp(c.x, left, right) - c.x;
+  const double nearY = std::clamp(c.y, top, bottom) - c.y;
+  if (nearX * nearX + nearY * nearY > r * r)
+    return BoxAndCircle::kOutside;
+  const double farX = std::max(std::abs(left - c.x), std::abs(right - c.x));
+  const double farY = std::max(std::abs(top - c.y), std::abs(bottom - c.y));
+  if (farX * farX + farY * farY <= r * r)
+    return BoxAndCircle::kInside;
+  return BoxAndCircle::kCrossing;
+}
+
+// Points on the circle's arc that can lie inside `box`, for a huge circle that crosses the
+// box (so its centre lies outside the box): the angular span of the box seen from the centre,
+// finely sampled.
 std::vector<PointD> ArcThroughBox(PointD c, double r, double left, double top, double right,
                                   double bottom) {
   const PointD corners[4] = {{left, top}, {right, top}, {right, bottom}, {left, bottom}};
@@ -195,7 +212,7 @@ void DC::PushClip(const Rect& rect) {
 }
 
 void DC::PopClip() {
-  if (!DRAWING_VERIFY(mClipStack.size() > 1, "PopClip without PushClip"))
+  if (!HOST_VERIFY(mClipStack.size() > 1, "PopClip without PushClip"))
     return;
   mClipStack.pop_back();
   ApplyClip();
@@ -257,8 +274,8 @@ void DC::ClearRect(const Rect& rect, Color color) {
 void DC::FrameRect(const Rect& rect, Color color, int width) {
   if (rect.IsEmpty() || width <= 0)
     return;
-  const std::int64_t w = std::min<std::int64_t>(width, std::min(rect.Width(), rect.Height()));
   const std::int64_t l = rect.left, t = rect.top, r = rect.right, b = rect.bottom;
+  const std::int64_t w = std::min<std::int64_t>(width, std::min(r - l, b - t));
   auto fill = [&](std::int64_t x0, std::int64_t y0, std::int64_t x1, std::int64_t y1) {
     // Clamp to int so that FillRect's own 64-bit clipping applies; the parts are within rect.
     auto c = [](std::int64_t v) {
@@ -392,19 +409,21 @@ void DC::DrawCircleFill(Point center, int radius, Color color) {
   }
   const double left = clip.left - kCullMargin, top = clip.top - kCullMargin;
   const double right = clip.right + kCullMargin, bottom = clip.bottom + kCullMargin;
+  switch (CircleMeetsBox(c, r, left, top, right, bottom)) {
+    case BoxAndCircle::kOutside:
+      return;
+    case BoxAndCircle::kInside:
+      cairo_rectangle(mCairo, clip.left, clip.top, clip.Width(), clip.Height());
+      cairo_fill(mCairo);
+      return;
+    case BoxAndCircle::kCrossing:
+      break;
+  }
   std::vector<PointD> wedge = ArcThroughBox(c, r, left, top, right, bottom);
   wedge.push_back(c);
   wedge = ClipPolygon(std::move(wedge), left, top, right, bottom);
-  if (wedge.size() < 3) {
-    // The box lies wholly inside the disc, or the arc misses it.
-    const double dx = std::max(std::abs(left - c.x), std::abs(right - c.x));
-    const double dy = std::max(std::abs(top - c.y), std::abs(bottom - c.y));
-    if (dx * dx + dy * dy > r * r)
-      return;
-    cairo_rectangle(mCairo, clip.left, clip.top, clip.Width(), clip.Height());
-    cairo_fill(mCairo);
+  if (wedge.size() < 3)
     return;
-  }
   cairo_move_to(mCairo, wedge[0].x, wedge[0].y);
   for (std::size_t i = 1; i < wedge.size(); ++i)
     cairo_line_to(mCairo, wedge[i].x, wedge[i].y);
@@ -437,6 +456,8 @@ void DC::DrawCircle(Point center, int radius, Color color, double width) {
   const double margin = width + kCullMargin;
   const double left = clip.left - margin, top = clip.top - margin;
   const double right = clip.right + margin, bottom = clip.bottom + margin;
+  if (CircleMeetsBox(c, r, left, top, right, bottom) != BoxAndCircle::kCrossing)
+    return;
   const std::vector<PointD> arc = ArcThroughBox(c, r, left, top, right, bottom);
   bool drawn = false;
   for (std::size_t i = 1; i < arc.size(); ++i) {
@@ -462,26 +483,31 @@ void DC::DrawText(std::string_view text, const Rect& rect, const Font& font, Col
   const RectL visible = abs.Intersect(ClipInTarget());
   if (visible.IsEmpty())
     return;
-  const auto layout = font.GetLayout(text, rect.Width());
+  // Widths in 64 bits: a rect from -2^30 to 2^30 is wider than an int.
+  const std::int64_t rectWidth = abs.right - abs.left;
+  const std::int64_t rectHeight = abs.bottom - abs.top;
+  const auto layout = font.GetLayout(
+      text, static_cast<int>(std::min<std::int64_t>(rectWidth, std::numeric_limits<int>::max())));
   const double w = layout->GetWidth();
   const double h = layout->GetHeight();
   const double scale = GetScaleFactor();
   double x = static_cast<double>(abs.left);
-  if (w < rect.Width()) {
+  if (w < static_cast<double>(rectWidth)) {
     if (align == TextAlign::kCenter)
-      x += (rect.Width() - w) / 2;
+      x += (static_cast<double>(rectWidth) - w) / 2;
     if (align == TextAlign::kRight)
       x = static_cast<double>(abs.right) - w;
   }
   double y = static_cast<double>(abs.top);
   if (valign == TextVAlign::kCenter)
-    y += (rect.Height() - h) / 2;
+    y += (static_cast<double>(rectHeight) - h) / 2;
   if (valign == TextVAlign::kBottom)
     y = static_cast<double>(abs.bottom) - h;
   x = std::round(x * scale) / scale;
   y = std::round(y * scale) / scale;
-  if (x + layout->GetInkRight() < visible.left || x + layout->GetInkLeft() > visible.right ||
-      y + h < visible.top || y > visible.bottom) {
+  if (x + layout->GetInkRight() < static_cast<double>(visible.left) ||
+      x + layout->GetInkLeft() > static_cast<double>(visible.right) ||
+      y + h < static_cast<double>(visible.top) || y > static_cast<double>(visible.bottom)) {
     return;
   }
   cairo_save(mCairo);
@@ -555,7 +581,7 @@ void DC::DrawImage(const Image& image, const Rect& dest, double alpha) {
   const double sy = static_cast<double>(abs.bottom - abs.top) / pixels.height;
   // The back end's pattern matrices are fixed point: beyond this stretch they degenerate.
   constexpr double kMaxStretch = 4096.0;
-  if (!DRAWING_VERIFY(sx <= kMaxStretch && sy <= kMaxStretch, "Image stretched too far"))
+  if (!HOST_VERIFY(sx <= kMaxStretch && sy <= kMaxStretch, "Image stretched too far"))
     return;
   // Anchor the pattern at the visible corner so that far-off destinations stay in range.
   const double offsetX = static_cast<double>(visible.left - abs.left) / sx;

@@ -12,7 +12,7 @@ struct _cairo_surface;
 // An owned 32-bit ARGB pixel surface (premultiplied alpha, native-endian words, Cairo's
 // ARGB32 layout) with a scale factor: device pixels per logical pixel. Move-only.
 // A request for an impossible size (negative, zero, or beyond the back end's 32767 limit)
-// gives an empty image; drawing into an empty image does nothing.
+// gives an empty image; drawing into an empty image does nothing. A moved-from image is empty.
 class Image {
  public:
   Image();

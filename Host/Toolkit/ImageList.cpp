@@ -1,10 +1,10 @@
 #include "Host/Toolkit/ImageList.h"
 
+#include "Host/Messaging/Diagnostics.h"
 #include "Host/Toolkit/DC.h"
-#include "Host/Toolkit/DrawingDiagnostics.h"
 
 int ImageList::Add(std::shared_ptr<const Bitmap> bitmap) {
-  if (!DRAWING_VERIFY(bitmap != nullptr, "Null bitmap added to an image list"))
+  if (!HOST_VERIFY(bitmap != nullptr, "Null bitmap added to an image list"))
     return -1;
   mBitmaps.push_back(std::move(bitmap));
   return GetCount() - 1;
@@ -22,7 +22,7 @@ Size ImageList::GetImageSize(int index) const {
 }
 
 void ImageList::Draw(DC& dc, int index, Point topLeft, double alpha) const {
-  if (!DRAWING_VERIFY(index >= 0 && index < GetCount(), "Image list index out of range"))
+  if (!HOST_VERIFY(index >= 0 && index < GetCount(), "Image list index out of range"))
     return;
   dc.DrawBitmap(*mBitmaps[index], topLeft, alpha);
 }
