@@ -91,25 +91,31 @@ void HalfPath(cairo_t* cr, Half shape) {
 // halves (a first keyframe shows only its right half, a last one only its left).
 void PaintKeyframe(cairo_t* cr, Half left, Half right, bool drawLeft, bool drawRight, Color fill,
                    Color outline, bool centreLine) {
-  const Half shapes[2] = {left, right};
-  const bool draw[2] = {drawLeft, drawRight};
-  for (int side = 0; side < 2; ++side) {
-    if (!draw[side])
-      continue;
+  auto paintShape = [&](Half shape, double clipLeft, double clipRight) {
     cairo_save(cr);
-    if (side == 0) {
-      cairo_rectangle(cr, 0, 0, kCx, 16);
-    } else {
-      cairo_rectangle(cr, kCx, 0, 16 - kCx, 16);
-    }
+    cairo_rectangle(cr, clipLeft, 0, clipRight - clipLeft, 16);
     cairo_clip(cr);
-    HalfPath(cr, shapes[side]);
+    HalfPath(cr, shape);
     SetColor(cr, fill);
     cairo_fill_preserve(cr);
     SetColor(cr, outline, 0.85);
     cairo_set_line_width(cr, 1.0);
     cairo_stroke(cr);
     cairo_restore(cr);
+  };
+  // Halves are cut on whole pixels: a cut through the centre column would leave an
+  // antialiased seam. The centre column (7) belongs to the half that is drawn alone.
+  if (drawLeft && drawRight) {
+    if (left == right) {
+      paintShape(left, 0, 16);
+    } else {
+      paintShape(left, 0, 8);
+      paintShape(right, 8, 16);
+    }
+  } else if (drawLeft) {
+    paintShape(left, 0, 8);
+  } else if (drawRight) {
+    paintShape(right, 7, 16);
   }
   if (centreLine) {
     SetColor(cr, outline, 0.85);
