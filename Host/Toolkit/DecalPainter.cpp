@@ -1,11 +1,14 @@
 #include "Host/Toolkit/DecalPainter.h"
 
 #include <cairo.h>
+#include <pango/pangocairo.h>
 
 #include <cmath>
 #include <numbers>
 
 #include "Host/Toolkit/ColorManager.h"
+#include "Host/Toolkit/Font.h"
+#include "Host/Toolkit/TextLayout.h"
 
 namespace {
 
@@ -246,17 +249,19 @@ void Gear(cairo_t* cr, double cx, double cy, double outer, Color color) {
   cairo_set_fill_rule(cr, CAIRO_FILL_RULE_WINDING);
 }
 
+// Centres the ink of `text` on (cx, cy). Through the toolkit's fonts, so glyphs come from the
+// same DejaVu faces as the rest of the interface.
 void Text(cairo_t* cr, const char* text, double size, bool bold, bool italic, double cx, double cy,
           Color color) {
-  cairo_select_font_face(cr, "DejaVu Sans",
-                         italic ? CAIRO_FONT_SLANT_ITALIC : CAIRO_FONT_SLANT_NORMAL,
-                         bold ? CAIRO_FONT_WEIGHT_BOLD : CAIRO_FONT_WEIGHT_NORMAL);
-  cairo_set_font_size(cr, size);
-  cairo_text_extents_t extents;
-  cairo_text_extents(cr, text, &extents);
-  cairo_move_to(cr, cx - extents.width / 2 - extents.x_bearing,
-                cy - extents.height / 2 - extents.y_bearing);
-  cairo_text_path(cr, text);
+  const auto layout = Font(size, bold, italic).GetLayout(text);
+  PangoRectangle ink;
+  pango_layout_get_extents(layout->GetPangoLayout(), &ink, nullptr);
+  const double inkX = static_cast<double>(ink.x) / PANGO_SCALE;
+  const double inkY = static_cast<double>(ink.y) / PANGO_SCALE;
+  const double inkW = static_cast<double>(ink.width) / PANGO_SCALE;
+  const double inkH = static_cast<double>(ink.height) / PANGO_SCALE;
+  cairo_move_to(cr, cx - inkX - inkW / 2, cy - inkY - inkH / 2);
+  pango_cairo_layout_path(cr, layout->GetPangoLayout());
   Fill(cr, color);
 }
 
