@@ -1,0 +1,22 @@
+#pragma once
+
+#include <optional>
+
+#include "Host/Rows/Limiter.h"
+
+// A limiter whose bounds come from a range control's current handle values: for each handle a
+// lower bound L and an upper bound U. A value below L becomes L, one above U becomes U (L wins
+// when the bounds cross, so a handle never leaves its lower neighbour behind). Subclasses name
+// the bounds of each handle they answer for.
+class DoubleSliderLimiter : public Limiter {
+ public:
+  struct Bounds {
+    float lower = 0.0f;
+    float upper = 0.0f;
+  };
+
+  float Limit(int handleID, float value, bool& clamped) const override;
+
+  // The bounds of `handleID` as the control stands now; nullopt for a handle without bounds.
+  virtual std::optional<Bounds> GetBounds(int handleID) const = 0;
+};
