@@ -7,6 +7,7 @@
 #include <unordered_map>
 
 #include "Host/Messaging/Diagnostics.h"
+#include "Host/Messaging/Station.h"
 
 namespace {
 
@@ -180,6 +181,13 @@ class ColorState {
   StringMap<BaseColor> mBase;
 };
 
+void AnnounceChange(ColorState& state) {
+  ++state.generation;
+  ColorsChangedMessage message;
+  message.theme = state.theme;
+  BroadcastMessage(std::string(kColorManagerStation), message);
+}
+
 }  // namespace
 
 Color ColorManager::GetColor(std::string_view key) {
@@ -218,7 +226,7 @@ std::vector<ColorDefinitionProblem> ColorManager::RegisterColorSet(const std::st
   }
   std::erase_if(state.sets, [&](const ColorSet& s) { return s.name == name; });
   state.sets.push_back(std::move(set));
-  ++state.generation;
+  AnnounceChange(state);
   return parsed.problems;
 }
 
@@ -226,7 +234,7 @@ bool ColorManager::UnregisterColorSet(const std::string& name) {
   ColorState& state = ColorState::Get();
   const auto removed = std::erase_if(state.sets, [&](const ColorSet& s) { return s.name == name; });
   if (removed > 0)
-    ++state.generation;
+    AnnounceChange(state);
   return removed > 0;
 }
 
@@ -240,7 +248,7 @@ void ColorManager::SetTheme(ColorTheme theme) {
   if (state.theme == theme)
     return;
   state.theme = theme;
-  ++state.generation;
+  AnnounceChange(state);
 }
 
 ColorTheme ColorManager::GetTheme() {

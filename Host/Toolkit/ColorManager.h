@@ -5,10 +5,19 @@
 #include <string_view>
 #include <vector>
 
+#include "Host/Messaging/Message.h"
 #include "Host/Toolkit/Color.h"
 #include "Host/Toolkit/ColorDefinitionParser.h"
 
 enum class ColorTheme { kDark, kLight };
+
+// Broadcast on kColorManagerStation after the theme changed or a colour set was registered or
+// removed: views repaint, caches of drawn pictures drop what they hold.
+inline constexpr std::string_view kColorManagerStation = "Toolkit.ColorManager";
+struct ColorsChangedMessage : MessageOf<ColorsChangedMessage> {
+  static constexpr std::string_view kTypeName = "ColorsChangedMessage";
+  ColorTheme theme = ColorTheme::kDark;
+};
 
 // Toolkit colours (the names `$VOK(...)` accepts; also keys of ColorManager::GetColor).
 // "Reversible" colours are named for the light theme and reversed in the dark one:
@@ -72,14 +81,15 @@ class ColorManager {
   static bool HasColor(std::string_view key);
 
   // Registers (or replaces) the set `name` from colour-definition text. Malformed lines are
-  // skipped; they are returned and reported through the host debug assertion.
+  // skipped; they are returned and reported through the host debug assertion. Broadcasts
+  // ColorsChangedMessage.
   static std::vector<ColorDefinitionProblem> RegisterColorSet(const std::string& name,
                                                               std::string_view resourceText);
   // False when no set of that name is registered.
   static bool UnregisterColorSet(const std::string& name);
   static bool IsColorSetRegistered(const std::string& name);
 
-  // Dark is the default.
+  // Dark is the default. A change broadcasts ColorsChangedMessage.
   static void SetTheme(ColorTheme theme);
   static ColorTheme GetTheme();
   // Changes whenever any colour may have changed (theme, sets); caches of drawn pictures

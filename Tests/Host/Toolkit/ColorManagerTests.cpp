@@ -3,7 +3,9 @@
 #include <string>
 
 #include "Host/Messaging/Diagnostics.h"
+#include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessagingTestScope.h"
+#include "Host/Messaging/Station.h"
 #include "Host/Toolkit/ColorManager.h"
 
 namespace {
@@ -178,6 +180,22 @@ TEST_F(ColorManagerTest, SetsAreReplacedByNameAndTheNewestWins) {
   EXPECT_FALSE(ColorManager::UnregisterColorSet("first"));
   EXPECT_FALSE(ColorManager::HasColor("colors.k"));
   EXPECT_TRUE(ColorManager::HasColor("colors.other"));
+}
+
+TEST_F(ColorManagerTest, ChangesAreAnnouncedToListeners) {
+  std::vector<ColorTheme> themes;
+  FunctionListener listener([&](const Message& message) {
+    if (const auto* changed = message.As<ColorsChangedMessage>())
+      themes.push_back(changed->theme);
+  });
+  AddListener(std::string(kColorManagerStation), listener);
+  ColorManager::SetTheme(ColorTheme::kLight);
+  ColorManager::SetTheme(ColorTheme::kLight);  // no change, no message
+  ColorManager::RegisterColorSet("set", "colors.k = $RGB(1, 1, 1)\n");
+  ColorManager::UnregisterColorSet("set");
+  ColorManager::UnregisterColorSet("set");  // nothing removed, no message
+  EXPECT_EQ(themes,
+            (std::vector<ColorTheme>{ColorTheme::kLight, ColorTheme::kLight, ColorTheme::kLight}));
 }
 
 TEST(Color, MixAndHex) {
