@@ -1,0 +1,292 @@
+#include "Host/Model/EffectCatalogue.h"
+
+#include <utility>
+
+#include "Host/Model/ComponentParam.h"
+
+namespace {
+
+ComponentRef MakeEffect(const char* matchName, const char* name, MediaType mediaType,
+                        bool intrinsic) {
+  ComponentRef effect = Component::Create(matchName, name, mediaType, intrinsic);
+  effect->SetPresets({ComponentPreset{"Default", {}}});
+  effect->SetCurrentPreset(0);
+  return effect;
+}
+
+ComponentParamRef Scalar(const char* name, double value, double minimum, double maximum,
+                         int precision, ParamUnits units = ParamUnits::None,
+                         ParamType type = ParamType::FloatSlider) {
+  return ComponentParam::Create(name, type, value)
+      ->SetRange(minimum, maximum)
+      ->SetPrecision(precision)
+      ->SetUnits(units);
+}
+
+ComponentParamRef Point(const char* name, double x, double y) {
+  return ComponentParam::Create(name, ParamType::Point, ParamPoint{x, y})
+      ->SetRange(-100000.0, 100000.0)
+      ->SetPrecision(1)
+      ->SetUnits(ParamUnits::Pixels);
+}
+
+ComponentParamRef Check(const char* name, bool value, bool canVary = true) {
+  return ComponentParam::Create(name, ParamType::Checkbox, value)->SetCanVaryOverTime(canVary);
+}
+
+ComponentParamRef Menu(const char* name, std::vector<std::string> entries, bool canVary = true) {
+  return ComponentParam::Create(name, ParamType::Menu, ParamChoice{0})
+      ->SetMenuEntries(std::move(entries))
+      ->SetCanVaryOverTime(canVary);
+}
+
+ComponentParamRef Color(const char* name, ParamColor value) {
+  return ComponentParam::Create(name, ParamType::Color, value);
+}
+
+ComponentParamRef Group(const char* name, GroupKind kind = GroupKind::None,
+                        ParamValue value = false) {
+  return ComponentParam::Create(name, ParamType::GroupBegin, std::move(value))->SetGroupKind(kind);
+}
+
+ComponentParamRef GroupEnd() {
+  return ComponentParam::Create("", ParamType::GroupEnd, false);
+}
+
+ParamBlob TextBlob(std::string_view text) {
+  return ParamBlob{std::vector<std::uint8_t>(text.begin(), text.end())};
+}
+
+ComponentRef Motion() {
+  ComponentRef effect = MakeEffect(kMatchName_Motion, "Motion", MediaType::Video, true);
+  effect->AddParam(Point("Position", 960.0, 540.0));
+  effect->AddParam(
+      Scalar("Scale", 100.0, 0.0, 10000.0, 1, ParamUnits::Percent)->SetSliderRange(0.0, 100.0));
+  ComponentParamRef scaleWidth = Scalar("Scale Width", 100.0, 0.0, 10000.0, 1, ParamUnits::Percent)
+                                     ->SetSliderRange(0.0, 100.0);
+  scaleWidth->SetEnabled(false);  // follows Uniform Scale
+  effect->AddParam(scaleWidth);
+  effect->AddParam(Check("Uniform Scale", true, false));
+  effect->AddParam(Scalar("Rotation", 0.0, -1.0e6, 1.0e6, 1, ParamUnits::Degrees, ParamType::Angle)
+                       ->SetSliderRange(-180.0, 180.0));
+  effect->AddParam(Point("Anchor Point", 960.0, 540.0));
+  effect->AddParam(Scalar("Anti-flicker Filter", 0.0, 0.0, 1.0, 2)->SetStep(0.01));
+  return effect;
+}
+
+ComponentRef Opacity() {
+  ComponentRef effect = MakeEffect(kMatchName_Opacity, "Opacity", MediaType::Video, true);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Scalar("Opacity", 100.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  effect->AddParam(Menu(
+      "Blend Mode",
+      {"Normal", "Dissolve", "Darken", "Multiply", "Lighten", "Screen", "Overlay", "Difference"},
+      false));
+  return effect;
+}
+
+ComponentRef TimeRemapping() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_TimeRemapping, "Time Remapping", MediaType::Video, true);
+  effect->SetRole(ComponentRole::TimeRemapping);
+  effect->AddParam(
+      Scalar("Speed", 100.0, -1000.0, 1000.0, 2, ParamUnits::Percent, ParamType::TimeRemapping)
+          ->SetSliderRange(0.0, 200.0));
+  return effect;
+}
+
+ComponentParamRef Gain(const char* name) {
+  // Linear gain; 5.6234 is +15 dB.
+  return Scalar(name, 1.0, 0.0, 5.6234, 1, ParamUnits::Decibels, ParamType::AudioGain)
+      ->SetStep(0.01);
+}
+
+ComponentRef Volume() {
+  ComponentRef effect = MakeEffect(kMatchName_Volume, "Volume", MediaType::Audio, true);
+  effect->AddParam(Check("Bypass", false));
+  effect->AddParam(Gain("Level"));
+  return effect;
+}
+
+ComponentRef ChannelVolume() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_ChannelVolume, "Channel Volume", MediaType::Audio, true);
+  effect->AddParam(Check("Bypass", false));
+  effect->AddParam(Gain("Left"));
+  effect->AddParam(Gain("Right"));
+  return effect;
+}
+
+ComponentRef Panner() {
+  ComponentRef effect = MakeEffect(kMatchName_Panner, "Panner", MediaType::Audio, true);
+  effect->AddParam(Scalar("Balance", 0.0, -100.0, 100.0, 1));
+  return effect;
+}
+
+ComponentRef GaussianBlur() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_GaussianBlur, "Gaussian Blur", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Scalar("Blurriness", 0.0, 0.0, 3000.0, 1)->SetSliderRange(0.0, 100.0));
+  effect->AddParam(Menu("Blur Dimensions", {"Horizontal and Vertical", "Horizontal", "Vertical"}));
+  effect->AddParam(Check("Repeat Edge Pixels", false));
+  effect->SetPresets({ComponentPreset{"Default", {}}, ComponentPreset{"Soft", {{0, 10.0}}},
+                      ComponentPreset{"Strong", {{0, 60.0}, {2, true}}}});
+  return effect;
+}
+
+ComponentRef BrightnessContrast() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_BrightnessContrast, "Brightness & Contrast", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Scalar("Brightness", 0.0, -100.0, 100.0, 1));
+  effect->AddParam(Scalar("Contrast", 0.0, -100.0, 100.0, 1));
+  return effect;
+}
+
+ComponentRef Crop() {
+  ComponentRef effect = MakeEffect(kMatchName_Crop, "Crop", MediaType::Video, false);
+  for (const char* edge : {"Left", "Top", "Right", "Bottom"}) {
+    effect->AddParam(Scalar(edge, 0.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  }
+  effect->AddParam(Check("Zoom", false));
+  effect->AddParam(
+      Scalar("Edge Feather", 0.0, 0.0, 1000.0, 0, ParamUnits::Pixels, ParamType::Slider)
+          ->SetSliderRange(0.0, 100.0));
+  return effect;
+}
+
+ComponentRef Tint() {
+  ComponentRef effect = MakeEffect(kMatchName_Tint, "Tint", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Color("Map Black To", ParamColor{0.0f, 0.0f, 0.0f, 1.0f}));
+  effect->AddParam(Color("Map White To", ParamColor{1.0f, 1.0f, 1.0f, 1.0f}));
+  effect->AddParam(Scalar("Amount to Tint", 100.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  return effect;
+}
+
+ComponentRef Timecode() {
+  ComponentRef effect = MakeEffect(kMatchName_Timecode, "Timecode", MediaType::Video, false);
+  effect->AddParam(Group("Position and Size"));
+  effect->AddParam(Point("Position", 960.0, 900.0));
+  effect->AddParam(
+      Scalar("Size", 10.0, 0.0, 100.0, 1, ParamUnits::Percent, ParamType::DoubleSlider));
+  effect->AddParam(GroupEnd());
+  effect->AddParam(Menu("Time Display", {"Timecode", "Frames", "Feet + Frames"}, false));
+  effect->AddParam(Check("Field Symbol", true, false));
+  // Ticks, held as a double: exact below about 9.8 hours.
+  effect->AddParam(ComponentParam::Create("Starting Timecode", ParamType::Timecode, 0.0)
+                       ->SetRange(0.0, 9.0e15)
+                       ->SetCanVaryOverTime(false));
+  effect->AddParam(Scalar("Offset", 0.0, -100.0, 100.0, 0, ParamUnits::None, ParamType::Slider));
+  return effect;
+}
+
+ComponentRef GridDistortion() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_GridDistortion, "Grid Distortion", MediaType::Video, false);
+  effect->SetHasSetupDialog(true);
+  effect->AddParam(ComponentParam::Create("Grid", ParamType::Custom, ParamBlob{}));
+  effect->AddParam(
+      ComponentParam::Create("Reset Grid", ParamType::Button, false)->SetCanVaryOverTime(false));
+  // A counted group: its value lists the parameters it spans, one per semicolon.
+  effect->AddParam(Group("Advanced", GroupKind::Counted, TextBlob("Smoothness;Settings;")));
+  effect->AddParam(Scalar("Smoothness", 0.5, 0.0, 1.0, 2, ParamUnits::None, ParamType::DoubleSlider)
+                       ->SetStep(0.01));
+  effect->AddParam(ComponentParam::Create("Settings", ParamType::Opaque, ParamBlob{}));
+  return effect;
+}
+
+ComponentRef Delay() {
+  ComponentRef effect = MakeEffect(kMatchName_Delay, "Delay", MediaType::Audio, false);
+  effect->AddParam(Scalar("Delay", 1.0, 0.0, 2.0, 3, ParamUnits::Seconds)->SetStep(0.001));
+  effect->AddParam(Scalar("Feedback", 0.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  effect->AddParam(Scalar("Mix", 50.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  return effect;
+}
+
+ComponentRef Mask() {
+  ComponentRef effect = MakeEffect(kMatchName_Mask, "Mask", MediaType::Video, false);
+  effect->AddParam(
+      Scalar("Mask Feather", 10.0, 0.0, 1000.0, 1, ParamUnits::Pixels)->SetSliderRange(0.0, 100.0));
+  effect->AddParam(Scalar("Mask Opacity", 100.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  effect->AddParam(Scalar("Mask Expansion", 0.0, -1000.0, 1000.0, 1, ParamUnits::Pixels)
+                       ->SetSliderRange(-100.0, 100.0));
+  effect->AddParam(Check("Inverted", false));
+  effect->AddParam(Menu("Mask Mode", {"None", "Add", "Subtract", "Intersect"}, false));
+  effect->AddParam(Color("Mask Color", ParamColor{0.6f, 0.6f, 1.0f, 1.0f}));
+  effect->AddParam(ComponentParam::Create("Mask Path", ParamType::Custom, ParamBlob{}));
+  effect->AddParam(Group("Track Mask", GroupKind::Buttons));
+  effect->AddParam(GroupEnd());
+  effect->AddParam(ComponentParam::Create("Shape", ParamType::Info, std::string("Ellipse"))
+                       ->SetCanVaryOverTime(false));
+  effect->AddParam(
+      ComponentParam::Create("Notes", ParamType::Text, std::string())->SetCanVaryOverTime(false));
+  effect->AddParam(Menu("Tracking Method",
+                        {"Position", "Position & Rotation", "Position, Scale & Rotation"}, false));
+  return effect;
+}
+
+EffectCatalogue MakeStandard() {
+  EffectCatalogue catalogue;
+  for (ComponentRef effect :
+       {Motion(), Opacity(), TimeRemapping(), Volume(), ChannelVolume(), Panner(), GaussianBlur(),
+        BrightnessContrast(), Crop(), Tint(), Timecode(), GridDistortion(), Delay(), Mask()}) {
+    catalogue.Register(std::move(effect));
+  }
+  return catalogue;
+}
+
+}  // namespace
+
+const EffectCatalogue& EffectCatalogue::Standard() {
+  static const EffectCatalogue standard = MakeStandard();
+  return standard;
+}
+
+void EffectCatalogue::Register(ComponentRef effectTemplate) {
+  if (!effectTemplate) {
+    return;
+  }
+  std::erase_if(mTemplates, [&](const ComponentRef& existing) {
+    return existing->GetMatchName() == effectTemplate->GetMatchName();
+  });
+  mTemplates.push_back(std::move(effectTemplate));
+}
+
+const Component* EffectCatalogue::FindTemplate(std::string_view matchName) const {
+  for (const ComponentRef& effect : mTemplates) {
+    if (effect->GetMatchName() == matchName) {
+      return effect.get();
+    }
+  }
+  return nullptr;
+}
+
+ComponentRef EffectCatalogue::Create(std::string_view matchName) const {
+  const Component* effect = FindTemplate(matchName);
+  return effect ? effect->Clone() : nullptr;
+}
+
+std::vector<std::string> EffectCatalogue::GetMatchNames() const {
+  std::vector<std::string> names;
+  for (const ComponentRef& effect : mTemplates) {
+    names.push_back(effect->GetMatchName());
+  }
+  return names;
+}
+
+std::vector<ComponentRef> EffectCatalogue::CreateIntrinsics(MediaType mediaType) const {
+  std::vector<ComponentRef> intrinsics;
+  const auto names = mediaType == MediaType::Video
+                         ? std::vector<const char*>{kMatchName_Motion, kMatchName_Opacity,
+                                                    kMatchName_TimeRemapping}
+                         : std::vector<const char*>{kMatchName_Volume, kMatchName_ChannelVolume,
+                                                    kMatchName_Panner};
+  for (const char* name : names) {
+    if (ComponentRef effect = Create(name)) {
+      intrinsics.push_back(std::move(effect));
+    }
+  }
+  return intrinsics;
+}

@@ -1,0 +1,53 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "Host/Model/Component.h"
+#include "Host/Model/ModelRefs.h"
+#include "Host/Model/ModelTypes.h"
+
+// Match names of the built-in effects.
+inline constexpr const char* kMatchName_Motion = "XO.KRVN Motion";
+inline constexpr const char* kMatchName_Opacity = "XO.KRVN Opacity";
+inline constexpr const char* kMatchName_TimeRemapping = "XO.KRVN TimeRemapping";
+inline constexpr const char* kMatchName_Volume = "XO.KRVN Volume";
+inline constexpr const char* kMatchName_ChannelVolume = "XO.KRVN ChannelVolume";
+inline constexpr const char* kMatchName_Panner = "XO.KRVN Panner";
+inline constexpr const char* kMatchName_GaussianBlur = "XO.KRVN GaussianBlur";
+inline constexpr const char* kMatchName_BrightnessContrast = "XO.KRVN BrightnessContrast";
+inline constexpr const char* kMatchName_Crop = "XO.KRVN Crop";
+inline constexpr const char* kMatchName_Tint = "XO.KRVN Tint";
+inline constexpr const char* kMatchName_Timecode = "XO.KRVN Timecode";
+inline constexpr const char* kMatchName_GridDistortion = "XO.KRVN GridDistortion";
+inline constexpr const char* kMatchName_Delay = "XO.KRVN Delay";
+inline constexpr const char* kMatchName_Mask = "XO.KRVN Mask";
+
+// Positions (from 0) of the mask parameters the tracker works with.
+inline constexpr std::size_t kMaskParamPath = 6;
+inline constexpr std::size_t kMaskParamTrackingMethod = 11;
+
+// The effects the host can create, by match name: templates that are cloned, never used in a
+// chain themselves. Each template has preset 0 holding its defaults.
+class EffectCatalogue {
+ public:
+  EffectCatalogue() = default;
+
+  // The built-in effects: intrinsics (motion, opacity, time remapping; volume, channel volume,
+  // panner), applied video and audio effects and the mask. Thread-safe to read.
+  static const EffectCatalogue& Standard();
+
+  // Adds a template, replacing one with the same match name. The catalogue adopts it.
+  void Register(ComponentRef effectTemplate);
+  // nullptr when unknown.
+  const Component* FindTemplate(std::string_view matchName) const;
+  // A fresh copy of the template (new ids), or nullptr when unknown.
+  ComponentRef Create(std::string_view matchName) const;
+  std::vector<std::string> GetMatchNames() const;
+  // Fresh copies of the intrinsics every clip of the media type carries, in chain order.
+  std::vector<ComponentRef> CreateIntrinsics(MediaType mediaType) const;
+
+ private:
+  std::vector<ComponentRef> mTemplates;
+};
