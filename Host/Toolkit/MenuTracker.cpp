@@ -15,8 +15,8 @@ std::shared_ptr<MenuTracker>& InstalledTracker() {
   return tracker;
 }
 
-std::vector<PopupMenuEntry> BuildEntries(const std::vector<MenuItem>& items, Commander& commander) {
-  const ShortcutManager& shortcuts = ShortcutManager::Instance();
+std::vector<PopupMenuEntry> BuildEntries(const std::vector<MenuItem>& items, Commander& commander,
+                                         const ShortcutManager& shortcuts) {
   std::vector<PopupMenuEntry> entries;
   entries.reserve(items.size());
   for (const MenuItem& item : items) {
@@ -24,7 +24,7 @@ std::vector<PopupMenuEntry> BuildEntries(const std::vector<MenuItem>& items, Com
     entry.kind = item.kind;
     entry.text = LocalizeString(item.text);
     if (item.kind == MenuItem::Kind::kSubmenu) {
-      entry.submenu = BuildEntries(item.submenu, commander);
+      entry.submenu = BuildEntries(item.submenu, commander, shortcuts);
       entry.enabled = true;
     } else if (item.kind == MenuItem::Kind::kCommand) {
       if (const std::optional<CommandID> command = Menu::ResolveCommand(item, shortcuts)) {
@@ -69,31 +69,34 @@ std::shared_ptr<MenuTracker> GetMenuTracker() {
   return InstalledTracker();
 }
 
-PopupMenuRequest BuildPopupMenuRequest(const Menu& menu, Commander& commander, Point windowPoint) {
+PopupMenuRequest BuildPopupMenuRequest(const Menu& menu, Commander& commander, Point windowPoint,
+                                       const ShortcutManager* shortcuts) {
   PopupMenuRequest request;
   request.menuName = menu.GetName();
   request.windowPoint = windowPoint;
-  request.entries = BuildEntries(menu.GetItems(), commander);
+  request.entries = BuildEntries(menu.GetItems(), commander,
+                                 shortcuts != nullptr ? *shortcuts : ShortcutManager::Instance());
   return request;
 }
 
 std::optional<CommandID> RunPopupMenu(std::string_view menuName, Commander& commander,
-                                      Point windowPoint) {
+                                      Point windowPoint, const ShortcutManager* shortcuts) {
   const Menu* menu = MenuRegistry::Instance().Find(menuName);
   if (!HOST_VERIFY(menu != nullptr, "Unknown menu resource")) {
     return std::nullopt;
   }
   // A copy: the command may register menus again while it runs.
   const Menu shown = *menu;
-  return RunPopupMenu(shown, commander, windowPoint);
+  return RunPopupMenu(shown, commander, windowPoint, shortcuts);
 }
 
-std::optional<CommandID> RunPopupMenu(const Menu& menu, Commander& commander, Point windowPoint) {
+std::optional<CommandID> RunPopupMenu(const Menu& menu, Commander& commander, Point windowPoint,
+                                      const ShortcutManager* shortcuts) {
   const std::shared_ptr<MenuTracker> tracker = InstalledTracker();
   if (tracker == nullptr) {
     return std::nullopt;
   }
-  const PopupMenuRequest request = BuildPopupMenuRequest(menu, commander, windowPoint);
+  const PopupMenuRequest request = BuildPopupMenuRequest(menu, commander, windowPoint, shortcuts);
   const std::optional<CommandID> chosen = tracker->TrackPopupMenu(request);
   if (!chosen) {
     return std::nullopt;

@@ -12,6 +12,7 @@
 #include "Host/Toolkit/Menu.h"
 
 class Commander;
+class ShortcutManager;
 
 // A menu entry as shown: text localised, command resolved, status asked of the commander
 // chain. A command item whose command cannot be resolved is shown disabled.
@@ -55,12 +56,16 @@ inline std::shared_ptr<MenuTracker> SetMenuTrackerForTesting(std::shared_ptr<Men
 }
 
 // The request for `menu` with each command's status as `commander`'s chain reports it.
-PopupMenuRequest BuildPopupMenuRequest(const Menu& menu, Commander& commander, Point windowPoint);
+// Command names and key labels come from `shortcuts` (null: ShortcutManager::Instance()).
+PopupMenuRequest BuildPopupMenuRequest(const Menu& menu, Commander& commander, Point windowPoint,
+                                       const ShortcutManager* shortcuts = nullptr);
 
 // Shows the registered menu `menuName` through the tracker and sends the chosen command from
 // `commander` up its chain. An answer that is not an enabled command of the menu is ignored
 // with a debug assertion; an unknown menu is reported the same way. The chosen command (sent),
 // or nullopt.
 std::optional<CommandID> RunPopupMenu(std::string_view menuName, Commander& commander,
-                                      Point windowPoint);
-std::optional<CommandID> RunPopupMenu(const Menu& menu, Commander& commander, Point windowPoint);
+                                      Point windowPoint,
+                                      const ShortcutManager* shortcuts = nullptr);
+std::optional<CommandID> RunPopupMenu(const Menu& menu, Commander& commander, Point windowPoint,
+                                      const ShortcutManager* shortcuts = nullptr);

@@ -353,7 +353,9 @@ bool ViewBase::DoDragDrop(std::shared_ptr<const DataObject> data, DropEffect all
 
 std::optional<CommandID> ViewBase::TrackPopupMenu(std::string_view menuName, Point point) {
   const std::shared_ptr<const void> alive = KeepAliveForDispatch();
-  return RunPopupMenu(menuName, *this, LocalToWindow(point));
+  const ViewHost* host = GetHost();
+  return RunPopupMenu(menuName, *this, LocalToWindow(point),
+                      host != nullptr ? &host->GetShortcutManager() : nullptr);
 }
 
 // --- Life cycle ---

@@ -185,7 +185,11 @@ void ViewHost::MouseDown(MouseButton button, Point point, KeyModifiers modifiers
   if (mDrag != nullptr || button == MouseButton::kMiddle) {
     return;
   }
-  const std::shared_ptr<ViewBase> view = MouseTarget(point);
+  std::shared_ptr<ViewBase> view = CapturedView();
+  if (view == nullptr) {
+    view = HitView(point);
+    UpdateHover(view);
+  }
   if (view == nullptr || !view->IsEnabledInTree()) {
     return;
   }
