@@ -2,7 +2,6 @@
 
 #include <cctype>
 #include <cmath>
-#include <cstdio>
 #include <vector>
 
 namespace {
@@ -32,6 +31,14 @@ int Digits(std::int64_t value) {
     ++digits;
   }
   return digits;
+}
+
+void AppendPadded(std::string& text, std::uint64_t value, int width) {
+  const std::string digits = std::to_string(value);
+  if (static_cast<int>(digits.size()) < width) {
+    text.append(static_cast<std::size_t>(width) - digits.size(), '0');
+  }
+  text += digits;
 }
 
 TimecodeParseResult Failure(TimecodeError error, std::string message) {
@@ -138,16 +145,22 @@ std::string FrameRate::FormatTimecode(TickTime time) const {
   const std::uint64_t minutes = (totalSeconds / 60) % 60;
   const std::uint64_t hours = totalSeconds / 3600;
   const int frameDigits = std::max(2, Digits(mTimecodeBase - 1));
-  char buffer[64];
-  std::snprintf(buffer, sizeof buffer, "%s%02llu:%02llu:%02llu%c%0*llu", negative ? "-" : "",
-                static_cast<unsigned long long>(hours), static_cast<unsigned long long>(minutes),
-                static_cast<unsigned long long>(seconds), mDropFrame ? ';' : ':', frameDigits,
-                static_cast<unsigned long long>(frames));
-  return buffer;
+  std::string text = negative ? "-" : "";
+  AppendPadded(text, hours, 2);
+  text += ':';
+  AppendPadded(text, minutes, 2);
+  text += ':';
+  AppendPadded(text, seconds, 2);
+  text += mDropFrame ? ';' : ':';
+  AppendPadded(text, frames, frameDigits);
+  return text;
 }
 
 TimecodeParseResult FrameRate::ParseTimecode(std::string_view text) const {
-  const std::string quoted = "\"" + std::string(text) + "\"";
+  std::string quoted;
+  quoted += '"';
+  quoted.append(text);
+  quoted += '"';
   if (!IsValid()) {
     return Failure(TimecodeError::InvalidRate, "No valid frame rate to read " + quoted);
   }

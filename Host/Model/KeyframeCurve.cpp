@@ -1,6 +1,7 @@
 #include "Host/Model/KeyframeCurve.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cmath>
 #include <iterator>
 
@@ -12,8 +13,8 @@ constexpr double kMaximumSpeed = 1e200;
 // An edit of keyframe k changes auto tangents at k +- 1, path lengths of segments k - 2 .. k + 1,
 // auto speeds at k +- 2 and segments k - 3 .. k + 2; refreshing k +- 4 covers them all.
 constexpr std::size_t kRefreshRadius = 4;
-// A sampler walks this many segments before it falls back to a binary search.
-constexpr int kCursorSteps = 8;
+// A sampler steps over at most this many keyframes before it falls back to a binary search.
+constexpr std::size_t kCursorSteps = 8;
 
 constexpr double kTicksPerSecondD = static_cast<double>(kTicksPerSecond);
 
@@ -120,61 +121,6 @@ double ClampInfluence(double influence) {
   return std::clamp(influence, kMinimumInfluence, kMaximumInfluence);
 }
 
-double PolyX(const CurveSegment& g, double u) {
-  return ((g.xa * u + g.xb) * u + g.xc) * u;
-}
-double PolyY(const CurveSegment& g, double u) {
-  return ((g.ya * u + g.yb) * u + g.yc) * u + g.yd;
-}
-double SlopeX(const CurveSegment& g, double u) {
-  return (3.0 * g.xa * u + 2.0 * g.xb) * u + g.xc;
-}
-double SlopeY(const CurveSegment& g, double u) {
-  return (3.0 * g.ya * u + 2.0 * g.yb) * u + g.yc;
-}
-
-// The Bezier parameter u at which the segment reaches normalised time s in [0, 1]. Halley's
-// method from `u` (or from s, a good start because s(u) stays close to u), kept inside a
-// shrinking bracket and falling back to bisection; stops within half a tick (or at double
-// precision for very long segments). s(u) rises strictly, so the answer is unique.
-double SolveForU(const CurveSegment& g, double s, double u) {
-  const double tolerance = std::max(0.5 * g.invSpan, 4e-16);
-  double lo = 0.0;
-  double hi = 1.0;
-  if (!(u >= 0.0 && u <= 1.0)) {
-    u = s;
-  }
-  for (int i = 0; i < 64; ++i) {
-    const double x = PolyX(g, u) - s;
-    if (std::fabs(x) <= tolerance) {
-      return u;
-    }
-    if (x > 0.0) {
-      hi = u;
-    } else {
-      lo = u;
-    }
-    const double d1 = SlopeX(g, u);
-    const double d2 = 6.0 * g.xa * u + 2.0 * g.xb;
-    const double denominator = 2.0 * d1 * d1 - x * d2;
-    double next = denominator != 0.0 ? u - 2.0 * x * d1 / denominator : 0.5 * (lo + hi);
-    if (!(next > lo && next < hi)) {
-      next = 0.5 * (lo + hi);
-    }
-    u = next;
-  }
-  return u;
-}
-
-double NormalisedTime(const CurveSegment& g, TickTime time) {
-  return std::clamp(static_cast<double>(time - g.start) * g.invSpan, 0.0, 1.0);
-}
-
-// Value-units per second at parameter u of a Bezier segment.
-double BezierVelocity(const CurveSegment& g, double u) {
-  return SlopeY(g, u) / SlopeX(g, u) * g.invSpan * kTicksPerSecondD;
-}
-
 }  // namespace
 
 const char* ToString(CurveStatus status) {
@@ -201,6 +147,11 @@ const char* ToString(CurveStatus status) {
   return "unknown";
 }
 
+void KeyframeCurve::Touch() {
+  static std::atomic<std::uint64_t> revisions{0};
+  mRevision = revisions.fetch_add(1, std::memory_order_relaxed) + 1;
+}
+
 // ---------------------------------------------------------------------------------------------
 // Queries
 
@@ -211,55 +162,44 @@ std::optional<ParamValueKind> KeyframeCurve::Kind() const {
   return KindOf(mKeys.front().value);
 }
 
-namespace {
-
-bool TimeLess(const Keyframe& keyframe, TickTime time) {
-  return keyframe.time < time;
-}
-bool LessTime(TickTime time, const Keyframe& keyframe) {
-  return time < keyframe.time;
-}
-
-}  // namespace
-
 std::optional<std::size_t> KeyframeCurve::FindAt(TickTime time) const {
-  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
-  if (it == mKeys.end() || it->time != time) {
+  const auto it = std::lower_bound(mTimes.begin(), mTimes.end(), time);
+  if (it == mTimes.end() || *it != time) {
     return std::nullopt;
   }
-  return static_cast<std::size_t>(it - mKeys.begin());
+  return static_cast<std::size_t>(it - mTimes.begin());
 }
 
 std::optional<std::size_t> KeyframeCurve::FindBefore(TickTime time) const {
-  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
-  if (it == mKeys.begin()) {
+  const auto it = std::lower_bound(mTimes.begin(), mTimes.end(), time);
+  if (it == mTimes.begin()) {
     return std::nullopt;
   }
-  return static_cast<std::size_t>(it - mKeys.begin()) - 1;
+  return static_cast<std::size_t>(it - mTimes.begin()) - 1;
 }
 
 std::optional<std::size_t> KeyframeCurve::FindAfter(TickTime time) const {
-  const auto it = std::upper_bound(mKeys.begin(), mKeys.end(), time, LessTime);
-  if (it == mKeys.end()) {
+  const auto it = std::upper_bound(mTimes.begin(), mTimes.end(), time);
+  if (it == mTimes.end()) {
     return std::nullopt;
   }
-  return static_cast<std::size_t>(it - mKeys.begin());
+  return static_cast<std::size_t>(it - mTimes.begin());
 }
 
 std::optional<std::size_t> KeyframeCurve::FindAtOrBefore(TickTime time) const {
-  const auto it = std::upper_bound(mKeys.begin(), mKeys.end(), time, LessTime);
-  if (it == mKeys.begin()) {
+  const auto it = std::upper_bound(mTimes.begin(), mTimes.end(), time);
+  if (it == mTimes.begin()) {
     return std::nullopt;
   }
-  return static_cast<std::size_t>(it - mKeys.begin()) - 1;
+  return static_cast<std::size_t>(it - mTimes.begin()) - 1;
 }
 
 std::optional<std::size_t> KeyframeCurve::FindAtOrAfter(TickTime time) const {
-  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
-  if (it == mKeys.end()) {
+  const auto it = std::lower_bound(mTimes.begin(), mTimes.end(), time);
+  if (it == mTimes.end()) {
     return std::nullopt;
   }
-  return static_cast<std::size_t>(it - mKeys.begin());
+  return static_cast<std::size_t>(it - mTimes.begin());
 }
 
 std::optional<TickTime> KeyframeCurve::NextKeyframeTime(TickTime time) const {
@@ -283,9 +223,9 @@ std::vector<std::size_t> KeyframeCurve::FindInRange(TickTime first, TickTime las
   if (last < first) {
     return result;
   }
-  auto it = std::lower_bound(mKeys.begin(), mKeys.end(), first, TimeLess);
-  for (; it != mKeys.end() && it->time <= last; ++it) {
-    result.push_back(static_cast<std::size_t>(it - mKeys.begin()));
+  auto it = std::lower_bound(mTimes.begin(), mTimes.end(), first);
+  for (; it != mTimes.end() && *it <= last; ++it) {
+    result.push_back(static_cast<std::size_t>(it - mTimes.begin()));
   }
   return result;
 }
@@ -343,8 +283,8 @@ CurveStatus KeyframeCurve::Add(const Keyframe& keyframe) {
     return CurveStatus::DuplicateTime;
   }
   MakeContinuous(added, nullptr);
-  const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), added.time, TimeLess);
-  InsertKey(static_cast<std::size_t>(it - mKeys.begin()), added);
+  const auto it = std::lower_bound(mTimes.begin(), mTimes.end(), added.time);
+  InsertKey(static_cast<std::size_t>(it - mTimes.begin()), added);
   Touch();
   return CurveStatus::Ok;
 }
@@ -373,11 +313,12 @@ CurveStatus KeyframeCurve::Replace(std::size_t index, const Keyframe& keyframe) 
                             (index + 1 == mKeys.size() || replacement.time < mKeys[index + 1].time);
   if (staysInPlace) {
     mKeys[index] = replacement;
+    mTimes[index] = replacement.time;
     Refresh(index, index);
   } else {
     EraseKey(index);
-    const auto it = std::lower_bound(mKeys.begin(), mKeys.end(), replacement.time, TimeLess);
-    InsertKey(static_cast<std::size_t>(it - mKeys.begin()), replacement);
+    const auto it = std::lower_bound(mTimes.begin(), mTimes.end(), replacement.time);
+    InsertKey(static_cast<std::size_t>(it - mTimes.begin()), replacement);
   }
   Touch();
   return CurveStatus::Ok;
@@ -399,6 +340,7 @@ CurveStatus KeyframeCurve::RemoveAt(TickTime time) {
 
 void KeyframeCurve::Clear() {
   mKeys.clear();
+  mTimes.clear();
   mSegments.clear();
   mPathLengths.clear();
   mPaths.clear();
@@ -563,6 +505,7 @@ CurveStatus KeyframeCurve::ApplyAutomaticEase(std::size_t index, KeyframeSide si
 void KeyframeCurve::InsertKey(std::size_t index, const Keyframe& keyframe) {
   const std::size_t before = mKeys.size();
   mKeys.insert(mKeys.begin() + static_cast<std::ptrdiff_t>(index), keyframe);
+  mTimes.insert(mTimes.begin() + static_cast<std::ptrdiff_t>(index), keyframe.time);
   if (before == 0) {
     // The first keyframe sets the kind; nothing derived is left from an earlier kind.
     mSegments.clear();
@@ -580,6 +523,7 @@ void KeyframeCurve::EraseKey(std::size_t index) {
     EraseSlot(std::min(index, before - 2));
   }
   mKeys.erase(mKeys.begin() + static_cast<std::ptrdiff_t>(index));
+  mTimes.erase(mTimes.begin() + static_cast<std::ptrdiff_t>(index));
   if (!mKeys.empty()) {
     Refresh(index > 0 ? index - 1 : 0, std::min(index, mKeys.size() - 1));
   }
@@ -609,6 +553,9 @@ void KeyframeCurve::EraseSlot(std::size_t segment) {
 }
 
 void KeyframeCurve::RebuildAll() {
+  mTimes.resize(mKeys.size());
+  std::transform(mKeys.begin(), mKeys.end(), mTimes.begin(),
+                 [](const Keyframe& key) { return key.time; });
   const std::size_t segments = mKeys.size() < 2 ? 0 : mKeys.size() - 1;
   const std::optional<ParamValueKind> kind = Kind();
   mSegments.assign(segments, CurveSegment{});
@@ -676,11 +623,11 @@ void KeyframeCurve::RefreshPathLength(std::size_t segment) {
   const Keyframe& from = mKeys[segment];
   const Keyframe& to = mKeys[segment + 1];
   CurveSegment& g = mSegments[segment];
-  g.curvedPath = false;
+  g.SetCurvedPath(false);
   if (const ParamPoint* a = std::get_if<ParamPoint>(&from.value)) {
     const ParamPoint& b = std::get<ParamPoint>(to.value);
     if (!IsZero(from.outTangent) || !IsZero(to.inTangent)) {
-      g.curvedPath = true;
+      g.SetCurvedPath(true);
       mPathLengths[segment] =
           mPaths[segment].Build(*a, Plus(*a, from.outTangent), Plus(b, to.inTangent), b);
       return;
@@ -766,49 +713,31 @@ void KeyframeCurve::RefreshSegment(std::size_t segment) {
   CurveSegment& g = mSegments[segment];
   const ParamValueKind kind = KindOf(from.value);
   const bool path = IsPathKind(kind);
-  g.start = from.time;
-  g.end = to.time;
-  g.span = static_cast<double>(to.time - from.time);
-  g.invSpan = 1.0 / g.span;
-  g.y0 = path ? 0.0 : ScalarOf(from.value);
-  g.y3 = path ? mPathLengths[segment] : ScalarOf(to.value);
-  g.x1 = 1.0 / 3.0;
-  g.x2 = 2.0 / 3.0;
-  g.xa = 0.0;
-  g.xb = 0.0;
-  g.xc = 1.0;
-  g.ya = 0.0;
-  g.yb = 0.0;
-  g.yd = g.y0;
+  const double y0 = path ? 0.0 : ScalarOf(from.value);
+  const double y3 = path ? mPathLengths[segment] : ScalarOf(to.value);
   if (from.interpolation == TemporalInterpolation::Hold || !Interpolates(kind)) {
-    g.shape = CurveSegmentShape::Hold;
-    g.yc = 0.0;
+    g.MakeHold(from.time, to.time, y0, y3);
     return;
   }
   const bool straightOut = from.interpolation == TemporalInterpolation::Linear;
   const bool straightIn = to.interpolation == TemporalInterpolation::Linear ||
                           to.interpolation == TemporalInterpolation::Hold;
   if (straightOut && straightIn) {
-    g.shape = CurveSegmentShape::Linear;
-    g.yc = g.y3 - g.y0;
+    g.MakeLinear(from.time, to.time, y0, y3);
     return;
   }
-  g.shape = CurveSegmentShape::Bezier;
-  g.x1 = ClampInfluence(from.outInfluence) * 0.5;
-  g.x2 = 1.0 - ClampInfluence(to.inInfluence) * 0.5;
-  double y1 = g.y0 + Seconds(g.span * g.x1) * from.outSpeed;
-  double y2 = g.y3 - Seconds(g.span * (1.0 - g.x2)) * to.inSpeed;
+  // The inner control points are the handles (ComputeHandle), in exact rather than whole ticks.
+  const double span = static_cast<double>(to.time - from.time);
+  const double x1 = ClampInfluence(from.outInfluence) * 0.5;
+  const double x2 = 1.0 - ClampInfluence(to.inInfluence) * 0.5;
+  double y1 = y0 + Seconds(span * x1) * from.outSpeed;
+  double y2 = y3 - Seconds(span * (1.0 - x2)) * to.inSpeed;
   if (path) {
-    // Inside [0, length] the distance never runs back along the path nor beyond its ends.
-    y1 = std::clamp(y1, 0.0, g.y3);
-    y2 = std::clamp(y2, 0.0, g.y3);
+    // Inside [0, length] the distance neither runs back along the path nor beyond its ends.
+    y1 = std::clamp(y1, 0.0, y3);
+    y2 = std::clamp(y2, 0.0, y3);
   }
-  g.xc = 3.0 * g.x1;
-  g.xb = 3.0 * (g.x2 - 2.0 * g.x1);
-  g.xa = 1.0 + 3.0 * (g.x1 - g.x2);
-  g.yc = 3.0 * (y1 - g.y0);
-  g.yb = 3.0 * (g.y0 - 2.0 * y1 + y2);
-  g.ya = g.y3 - g.y0 + 3.0 * (y1 - y2);
+  g.MakeBezier(from.time, to.time, y0, y1, y2, y3, x1, x2);
 }
 
 // ---------------------------------------------------------------------------------------------
@@ -817,60 +746,31 @@ void KeyframeCurve::RefreshSegment(std::size_t segment) {
 std::ptrdiff_t KeyframeCurve::SegmentIndexFor(TickTime time, Approach approach) const {
   const auto n = static_cast<std::ptrdiff_t>(mKeys.size());
   const auto it = approach == Approach::FromRight
-                      ? std::upper_bound(mKeys.begin(), mKeys.end(), time, LessTime)
-                      : std::lower_bound(mKeys.begin(), mKeys.end(), time, TimeLess);
-  const std::ptrdiff_t index = (it - mKeys.begin()) - 1;
+                      ? std::upper_bound(mTimes.begin(), mTimes.end(), time)
+                      : std::lower_bound(mTimes.begin(), mTimes.end(), time);
+  const std::ptrdiff_t index = (it - mTimes.begin()) - 1;
   return std::min(index, n - 1);
 }
 
-ParamValue KeyframeCurve::SegmentValue(std::size_t segment, TickTime time, double* u) const {
+ParamValue KeyframeCurve::SegmentValue(std::size_t segment, TickTime time) const {
   const CurveSegment& g = mSegments[segment];
   const Keyframe& from = mKeys[segment];
-  if (g.shape == CurveSegmentShape::Hold || time <= g.start) {
+  if (g.Shape() == CurveSegmentShape::Hold || time <= g.Start()) {
     return from.value;
   }
   const Keyframe& to = mKeys[segment + 1];
-  if (time >= g.end) {
+  if (time >= g.End()) {
     return to.value;
   }
-  const double y = SegmentScalar(segment, time, u);
+  const double y = g.YAt(time);
   if (KindOf(from.value) == ParamValueKind::Double) {
     return y;
   }
-  if (g.curvedPath) {
+  if (g.IsCurvedPath()) {
     return mPaths[segment].PointAtDistance(y);
   }
-  const double f = g.y3 > 0.0 ? std::clamp(y / g.y3, 0.0, 1.0) : 0.0;
+  const double f = g.Y3() > 0.0 ? std::clamp(y / g.Y3(), 0.0, 1.0) : 0.0;
   return Blend(from.value, to.value, f);
-}
-
-double KeyframeCurve::SegmentScalar(std::size_t segment, TickTime time, double* u) const {
-  const CurveSegment& g = mSegments[segment];
-  switch (g.shape) {
-    case CurveSegmentShape::Hold:
-      return g.y0;
-    case CurveSegmentShape::Linear:
-      return g.y0 + g.yc * NormalisedTime(g, time);
-    case CurveSegmentShape::Bezier:
-      break;
-  }
-  const double s = NormalisedTime(g, time);
-  *u = SolveForU(g, s, *u);
-  return PolyY(g, *u);
-}
-
-double KeyframeCurve::SegmentVelocity(std::size_t segment, TickTime time, double* u) const {
-  const CurveSegment& g = mSegments[segment];
-  switch (g.shape) {
-    case CurveSegmentShape::Hold:
-      return 0.0;
-    case CurveSegmentShape::Linear:
-      return g.yc * g.invSpan * kTicksPerSecondD;
-    case CurveSegmentShape::Bezier:
-      break;
-  }
-  *u = SolveForU(g, NormalisedTime(g, time), *u);
-  return BezierVelocity(g, *u);
 }
 
 std::optional<ParamValue> KeyframeCurve::ValueAt(TickTime time) const {
@@ -884,8 +784,7 @@ std::optional<ParamValue> KeyframeCurve::ValueAt(TickTime time) const {
   if (segment >= static_cast<std::ptrdiff_t>(mKeys.size()) - 1) {
     return mKeys.back().value;
   }
-  double u = -1.0;
-  return SegmentValue(static_cast<std::size_t>(segment), time, &u);
+  return SegmentValue(static_cast<std::size_t>(segment), time);
 }
 
 std::optional<double> KeyframeCurve::ScalarAt(TickTime time) const {
@@ -898,8 +797,7 @@ double KeyframeCurve::VelocityAt(TickTime time, Approach approach) const {
   if (segment < 0 || segment >= static_cast<std::ptrdiff_t>(mKeys.size()) - 1) {
     return 0.0;
   }
-  double u = -1.0;
-  return SegmentVelocity(static_cast<std::size_t>(segment), time, &u);
+  return mSegments[static_cast<std::size_t>(segment)].VelocityAt(time);
 }
 
 std::vector<VelocitySample> KeyframeCurve::CreateVelocitySegment(TickTime from, TickTime to,
@@ -952,54 +850,17 @@ void KeyframeCurve::VelocityExtremes(TickTime from, TickTime to, double* minimum
       std::max<std::ptrdiff_t>(0, SegmentIndexFor(from, Approach::FromRight));
   for (auto s = static_cast<std::size_t>(firstSegment); s + 1 < n; ++s) {
     const CurveSegment& g = mSegments[s];
-    if (g.start >= to) {
+    if (g.Start() >= to) {
       break;
     }
-    if (g.end <= from) {
+    if (g.End() <= from) {
       continue;
     }
-    switch (g.shape) {
-      case CurveSegmentShape::Hold:
-        include(0.0);
-        continue;
-      case CurveSegmentShape::Linear:
-        include(g.yc * g.invSpan * kTicksPerSecondD);
-        continue;
-      case CurveSegmentShape::Bezier:
-        break;
-    }
-    const double ua = SolveForU(g, NormalisedTime(g, std::max(from, g.start)), -1.0);
-    const double ub = SolveForU(g, NormalisedTime(g, std::min(to, g.end)), -1.0);
-    include(BezierVelocity(g, ua));
-    include(BezierVelocity(g, ub));
-    // Turning points of y'(u) / x'(u): y''x' - y'x'' = 0 is a quadratic (the cubic terms cancel).
-    const double qa = 6.0 * (g.ya * g.xb - g.yb * g.xa);
-    const double qb = 6.0 * (g.ya * g.xc - g.yc * g.xa);
-    const double qc = 2.0 * (g.yb * g.xc - g.yc * g.xb);
-    double roots[2];
-    int count = 0;
-    const double scale = std::max({std::fabs(qa), std::fabs(qb), std::fabs(qc)});
-    if (scale == 0.0) {
-      // Constant velocity.
-    } else if (std::fabs(qa) <= 1e-12 * scale) {
-      if (qb != 0.0) {
-        roots[count++] = -qc / qb;
-      }
-    } else {
-      const double discriminant = qb * qb - 4.0 * qa * qc;
-      if (discriminant >= 0.0) {
-        const double q = -0.5 * (qb + std::copysign(std::sqrt(discriminant), qb));
-        roots[count++] = q / qa;
-        if (q != 0.0) {
-          roots[count++] = qc / q;
-        }
-      }
-    }
-    for (int i = 0; i < count; ++i) {
-      if (roots[i] > ua && roots[i] < ub) {
-        include(BezierVelocity(g, roots[i]));
-      }
-    }
+    double low = 0.0;
+    double high = 0.0;
+    g.VelocityRange(from, to, &low, &high);
+    include(low);
+    include(high);
   }
   if (!any) {
     include(0.0);
@@ -1050,49 +911,63 @@ std::optional<KeyframeHandle> KeyframeCurve::ComputeHandle(std::size_t index,
 // ---------------------------------------------------------------------------------------------
 // Sampler
 
-std::ptrdiff_t KeyframeCurve::Sampler::Locate(TickTime time, Approach approach) {
+void KeyframeCurve::Sampler::Sync() {
   const KeyframeCurve& curve = *mCurve;
-  const std::size_t n = curve.mKeys.size();
-  if (mRevision != curve.mRevision) {
-    mRevision = curve.mRevision;
-    mSegment = 0;
-    mLastU = -1.0;
+  if (mRevision == curve.mRevision) {
+    return;
   }
+  mRevision = curve.mRevision;
+  mSegment = 0;
+  const std::optional<ParamValueKind> kind = curve.Kind();
+  mScalarSegments = kind == ParamValueKind::Double || kind == ParamValueKind::Bool ||
+                    kind == ParamValueKind::Choice;
+}
+
+std::ptrdiff_t KeyframeCurve::Sampler::Locate(TickTime time, Approach approach) {
+  Sync();
+  const KeyframeCurve& curve = *mCurve;
+  const std::size_t n = curve.mTimes.size();
   if (n < 2) {
     return curve.SegmentIndexFor(time, approach);
   }
-  const std::size_t last = n - 2;
-  mSegment = std::min(mSegment, last);
-  const auto inside = [&](const CurveSegment& g) {
-    return approach == Approach::FromRight ? g.start <= time && time < g.end
-                                           : g.start < time && time <= g.end;
+  // Segment k runs from times[k] to times[k + 1] and answers for `time` when times[k] is
+  // "reached" and times[k + 1] is not. The compact time list keeps the walk in cache.
+  const TickTime* times = curve.mTimes.data();
+  const auto reached = [&](TickTime t) {
+    return approach == Approach::FromRight ? t <= time : t < time;
   };
-  const CurveSegment* segments = curve.mSegments.data();
-  if (inside(segments[mSegment])) {
-    return static_cast<std::ptrdiff_t>(mSegment);
-  }
-  const std::size_t previous = mSegment;
-  const bool later = approach == Approach::FromRight ? time >= segments[mSegment].end
-                                                     : time > segments[mSegment].end;
-  std::ptrdiff_t found = -2;
-  for (int step = 0; step < kCursorSteps; ++step) {
-    if (later ? mSegment == last : mSegment == 0) {
-      break;
+  const std::size_t last = n - 2;
+  const std::size_t k = std::min(mSegment, last);
+  if (reached(times[k])) {
+    if (!reached(times[k + 1])) {
+      return static_cast<std::ptrdiff_t>(k);
     }
-    mSegment = later ? mSegment + 1 : mSegment - 1;
-    if (inside(segments[mSegment])) {
-      found = static_cast<std::ptrdiff_t>(mSegment);
-      break;
+    // Forward within the next kCursorSteps keyframes: count the reached ones without branching,
+    // so an irregular stride costs no mispredictions.
+    if (k + kCursorSteps <= last + 1) {
+      std::size_t j = k;
+      for (std::size_t i = 1; i <= kCursorSteps; ++i) {
+        j += reached(times[k + i]) ? 1 : 0;
+      }
+      if (j < k + kCursorSteps) {
+        mSegment = j;
+        return static_cast<std::ptrdiff_t>(j);
+      }
+    }
+  } else if (k >= kCursorSteps) {
+    // Backward likewise, for a graph sampled from right to left.
+    std::size_t passed = 0;
+    for (std::size_t i = 1; i <= kCursorSteps; ++i) {
+      passed += reached(times[k - i]) ? 0 : 1;
+    }
+    if (passed < kCursorSteps) {
+      mSegment = k - passed - 1;
+      return static_cast<std::ptrdiff_t>(mSegment);
     }
   }
-  if (found == -2) {
-    found = curve.SegmentIndexFor(time, approach);
-    mSegment = static_cast<std::size_t>(
-        std::clamp<std::ptrdiff_t>(found, 0, static_cast<std::ptrdiff_t>(last)));
-  }
-  if (mSegment != previous) {
-    mLastU = -1.0;
-  }
+  const std::ptrdiff_t found = curve.SegmentIndexFor(time, approach);
+  mSegment = static_cast<std::size_t>(
+      std::clamp<std::ptrdiff_t>(found, 0, static_cast<std::ptrdiff_t>(last)));
   return found;
 }
 
@@ -1108,27 +983,23 @@ std::optional<ParamValue> KeyframeCurve::Sampler::ValueAt(TickTime time) {
   if (segment >= static_cast<std::ptrdiff_t>(curve.mKeys.size()) - 1) {
     return curve.mKeys.back().value;
   }
-  return curve.SegmentValue(static_cast<std::size_t>(segment), time, &mLastU);
+  return curve.SegmentValue(static_cast<std::size_t>(segment), time);
 }
 
 std::optional<double> KeyframeCurve::Sampler::ScalarAt(TickTime time) {
   const KeyframeCurve& curve = *mCurve;
-  if (curve.mKeys.empty()) {
+  const std::ptrdiff_t segment = Locate(time, Approach::FromRight);
+  if (!mScalarSegments) {
     return std::nullopt;
   }
-  const std::ptrdiff_t segment = Locate(time, Approach::FromRight);
   if (segment < 0) {
     return AsScalar(curve.mKeys.front().value);
   }
   if (segment >= static_cast<std::ptrdiff_t>(curve.mKeys.size()) - 1) {
     return AsScalar(curve.mKeys.back().value);
   }
-  const ParamValueKind kind = KindOf(curve.mKeys.front().value);
-  if (kind != ParamValueKind::Double && kind != ParamValueKind::Bool &&
-      kind != ParamValueKind::Choice) {
-    return std::nullopt;
-  }
-  return curve.SegmentScalar(static_cast<std::size_t>(segment), time, &mLastU);
+  // Segments hold the scalar readings of their ends, so no value is unpacked here.
+  return curve.mSegments[static_cast<std::size_t>(segment)].YAt(time);
 }
 
 double KeyframeCurve::Sampler::VelocityAt(TickTime time, Approach approach) {
@@ -1137,5 +1008,5 @@ double KeyframeCurve::Sampler::VelocityAt(TickTime time, Approach approach) {
   if (segment < 0 || segment >= static_cast<std::ptrdiff_t>(curve.mKeys.size()) - 1) {
     return 0.0;
   }
-  return curve.SegmentVelocity(static_cast<std::size_t>(segment), time, &mLastU);
+  return curve.mSegments[static_cast<std::size_t>(segment)].VelocityAt(time);
 }

@@ -131,7 +131,8 @@ class KeyframeCurve {
   // for scalars, the side's speed for points and colours. nullopt when it does not exist.
   std::optional<KeyframeHandle> ComputeHandle(std::size_t index, KeyframeSide side) const;
 
-  // Incremented by every successful edit.
+  // Changes with every successful edit and is unique across all curves of the process: two
+  // curves with the same revision hold the same keyframes (one was copied from the other).
   std::uint64_t Revision() const { return mRevision; }
 
   friend bool operator==(const KeyframeCurve& a, const KeyframeCurve& b) {
@@ -155,15 +156,12 @@ class KeyframeCurve {
   double SegmentSlope(std::size_t segment) const;
   // The segment that answers for `time`: -1 before the first keyframe, Size() - 1 after the last.
   std::ptrdiff_t SegmentIndexFor(TickTime time, Approach approach) const;
-  // Inside segment `segment` (start <= time <= end). `u` is the Bezier parameter of a nearby
-  // time, or negative when unknown; it receives the parameter of `time`.
-  ParamValue SegmentValue(std::size_t segment, TickTime time, double* u) const;
-  double SegmentScalar(std::size_t segment, TickTime time, double* u) const;
-  double SegmentVelocity(std::size_t segment, TickTime time, double* u) const;
+  ParamValue SegmentValue(std::size_t segment, TickTime time) const;
   void VelocityExtremes(TickTime from, TickTime to, double* minimum, double* maximum) const;
-  void Touch() { ++mRevision; }
+  void Touch();
 
   std::vector<Keyframe> mKeys;
+  std::vector<TickTime> mTimes;         // mTimes[k] == mKeys[k].time, compact for searching
   std::vector<CurveSegment> mSegments;  // mSegments[k] joins mKeys[k] and mKeys[k + 1]
   std::vector<double> mPathLengths;     // points and colours: length of segment k's path
   std::vector<CurvePath> mPaths;        // points: the path of segment k when it is curved
@@ -185,9 +183,10 @@ class KeyframeCurve::Sampler {
  private:
   // The segment for `time`, or -1 before the first keyframe, Size() - 1 at or after the last.
   std::ptrdiff_t Locate(TickTime time, Approach approach);
+  void Sync();
 
   const KeyframeCurve* mCurve;  // not owned; the caller keeps the curve alive
   std::uint64_t mRevision = ~std::uint64_t{0};
   std::size_t mSegment = 0;
-  double mLastU = -1.0;
+  bool mScalarSegments = false;  // the curve's segments hold scalar values (not path distances)
 };
