@@ -15,6 +15,22 @@ class ComponentChain;
 class Component;
 class ComponentParam;
 
+// Reference counting through a forward declaration, so a header can hold a reference to an
+// object whose class it does not include.
+#define HOST_MODEL_DECLARE_REF_COUNTING(Class)     \
+  void intrusive_ptr_add_ref(const Class* object); \
+  void intrusive_ptr_release(const Class* object);
+HOST_MODEL_DECLARE_REF_COUNTING(Project)
+HOST_MODEL_DECLARE_REF_COUNTING(Sequence)
+HOST_MODEL_DECLARE_REF_COUNTING(Track)
+HOST_MODEL_DECLARE_REF_COUNTING(TrackItem)
+HOST_MODEL_DECLARE_REF_COUNTING(MasterClip)
+HOST_MODEL_DECLARE_REF_COUNTING(Media)
+HOST_MODEL_DECLARE_REF_COUNTING(ComponentChain)
+HOST_MODEL_DECLARE_REF_COUNTING(Component)
+HOST_MODEL_DECLARE_REF_COUNTING(ComponentParam)
+#undef HOST_MODEL_DECLARE_REF_COUNTING
+
 using ProjectRef = boost::intrusive_ptr<Project>;
 using SequenceRef = boost::intrusive_ptr<Sequence>;
 using TrackRef = boost::intrusive_ptr<Track>;
