@@ -1,0 +1,7 @@
+#pragma once
+
+#include <string_view>
+
+// examples/demo.json as it was at build time; empty when the repository had none. Generated
+// into the build folder by EmbedFile.cmake.
+std::string_view EmbeddedDemoProjectJSON();

@@ -1,0 +1,132 @@
+// effectcontrols: opens a project in the workspace and runs its panels in a window, or headless
+// from an automation script. Exit codes: 0 done, 1 the script stopped at a bad line, 2 the
+// program could not start (options, script file, project, window).
+
+#include <cstdlib>
+#include <filesystem>
+#include <iostream>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <variant>
+#include <vector>
+
+#include "Host/Messaging/MessageLoop.h"
+#include "Host/Model/Project.h"
+#include "Host/Shell/Application.h"
+#include "Host/Shell/AutomationScript.h"
+#include "Host/Shell/DemoProject.h"
+#include "Host/Shell/ProgramOptions.h"
+#include "Host/Shell/ScriptRunner.h"
+#include "Host/Shell/Sdl/SdlWindow.h"
+#include "Host/Shell/ViewHostInputRoute.h"
+#include "Host/Toolkit/Image.h"
+#include "Host/Toolkit/ViewHost.h"
+
+namespace {
+
+constexpr int kExitScriptFailed = 1;
+constexpr int kExitCannotStart = 2;
+
+bool HasDisplay() {
+  const char* x11 = std::getenv("DISPLAY");
+  const char* wayland = std::getenv("WAYLAND_DISPLAY");
+  return (x11 != nullptr && *x11 != '\0') || (wayland != nullptr && *wayland != '\0');
+}
+
+int Fail(int code, const std::string& message) {
+  std::cerr << "effectcontrols: " << message << "\n";
+  return code;
+}
+
+void Settle(Application& application) {
+  MessageLoop::Instance().RunPending();
+  application.GetViewHost().Render();
+}
+
+int ReportRun(const ScriptRunResult& result) {
+  for (const auto& path : result.written)
+    std::cout << "wrote " << path << "\n";
+  for (const auto& warning : result.warnings)
+    std::cerr << "effectcontrols: warning: " << warning << "\n";
+  if (!result.ok)
+    return Fail(kExitScriptFailed, result.Describe());
+  return EXIT_SUCCESS;
+}
+
+int Run(const ProgramOptions& options) {
+  std::optional<AutomationScript> script;
+  if (!options.scriptPath.empty()) {
+    auto parsed = AutomationScript::ParseFile(options.scriptPath);
+    if (const auto* error = std::get_if<ScriptError>(&parsed)) {
+      // A script that does not parse changes nothing: report it before anything opens.
+      return Fail(error->line > 0 ? kExitScriptFailed : kExitCannotStart,
+                  options.scriptPath + ": " + error->Describe());
+    }
+    script = std::get<AutomationScript>(std::move(parsed));
+  }
+  if (!options.projectPath.empty()) {
+    return Fail(kExitCannotStart, "cannot open '" + options.projectPath +
+                                      "': opening project files is not available yet "
+                                      "(run without --project for the demo project)");
+  }
+
+  Application application(options.size);
+  application.LoadModules();
+  application.CreateHandlers();
+  application.OpenProject(BuildDemoProject());
+  application.OpenAllWindows();
+  Settle(application);
+
+  const bool windowed = !options.headless && HasDisplay();
+  if (windowed) {
+    std::string error;
+    const auto window = SdlWindow::Open(application.GetViewHost(), "Effect Controls", &error);
+    if (window == nullptr)
+      return Fail(kExitCannotStart, "cannot open a window (" + error + "); use --headless");
+    if (!script) {
+      window->Run();
+      return EXIT_SUCCESS;
+    }
+    int exitCode = EXIT_SUCCESS;
+    {
+      ScriptRunner runner(application, window->GetInputRoute(), options.outDir);
+      // Shots show what the window shows.
+      runner.SetShotSource([&window] { return window->ReadBack(); });
+      exitCode = ReportRun(runner.Run(*script));
+    }
+    window->RequestClose();
+    while (window->Pump(0)) {
+    }
+    return exitCode;
+  }
+
+  ViewHostInputRoute input(application.GetViewHost());
+  ScriptRunner runner(application, input, options.outDir);
+  if (script)
+    return ReportRun(runner.Run(*script));
+  // Headless without a script: one frame of the workspace.
+  const auto frame = AutomationScript::Parse("shot effectcontrols.png");
+  return ReportRun(runner.Run(std::get<AutomationScript>(frame)));
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  const std::vector<std::string_view> arguments(argv + (argc > 0 ? 1 : 0), argv + argc);
+  auto parsed = ProgramOptions::Parse(arguments);
+  if (const auto* error = std::get_if<std::string>(&parsed)) {
+    std::cerr << "effectcontrols: " << *error << "\n" << ProgramOptions::Usage();
+    return kExitCannotStart;
+  }
+  const auto& options = std::get<ProgramOptions>(parsed);
+  if (options.help) {
+    std::cout << ProgramOptions::Usage();
+    return EXIT_SUCCESS;
+  }
+  try {
+    return Run(options);
+  } catch (const std::exception& exception) {
+    return Fail(kExitCannotStart, std::string("stopped: ") + exception.what());
+  }
+}

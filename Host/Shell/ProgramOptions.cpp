@@ -1,0 +1,94 @@
+#include "Host/Shell/ProgramOptions.h"
+
+#include <charconv>
+#include <optional>
+
+namespace {
+
+constexpr int kMaxSide = 16384;
+
+std::optional<int> ParseSide(std::string_view text) {
+  int value = 0;
+  const auto* end = text.data() + text.size();
+  const auto [ptr, ec] = std::from_chars(text.data(), end, value);
+  if (ec != std::errc() || ptr != end || value < 1 || value > kMaxSide)
+    return std::nullopt;
+  return value;
+}
+
+std::optional<Size> ParseSize(std::string_view text) {
+  const auto x = text.find_first_of("xX");
+  if (x == std::string_view::npos)
+    return std::nullopt;
+  const auto width = ParseSide(text.substr(0, x));
+  const auto height = ParseSide(text.substr(x + 1));
+  if (!width || !height)
+    return std::nullopt;
+  return Size{*width, *height};
+}
+
+}  // namespace
+
+ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_view> arguments) {
+  ProgramOptions options;
+  bool sawProject = false, sawSize = false, sawScript = false, sawOut = false;
+  for (std::size_t i = 0; i < arguments.size(); ++i) {
+    std::string_view name = arguments[i];
+    std::optional<std::string_view> inlineValue;
+    if (const auto equals = name.find('='); name.starts_with("--") && equals != name.npos) {
+      inlineValue = name.substr(equals + 1);
+      name = name.substr(0, equals);
+    }
+    if (name == "--headless" || name == "--help" || name == "-h") {
+      if (inlineValue)
+        return std::string(name) + " takes no value";
+      (name == "--headless" ? options.headless : options.help) = true;
+      continue;
+    }
+    bool* seen = name == "--project"  ? &sawProject
+                 : name == "--size"   ? &sawSize
+                 : name == "--script" ? &sawScript
+                 : name == "--out"    ? &sawOut
+                                      : nullptr;
+    if (seen == nullptr)
+      return "unknown option '" + std::string(arguments[i]) + "'";
+    if (*seen)
+      return std::string(name) + " given twice";
+    *seen = true;
+    std::string_view value;
+    if (inlineValue) {
+      value = *inlineValue;
+    } else if (i + 1 < arguments.size()) {
+      value = arguments[++i];
+    } else {
+      return std::string(name) + " needs a value";
+    }
+    if (value.empty())
+      return std::string(name) + " needs a value";
+    if (name == "--size") {
+      const auto size = ParseSize(value);
+      if (!size) {
+        return "--size needs WxH with each side between 1 and " + std::to_string(kMaxSide) +
+               ", not '" + std::string(value) + "'";
+      }
+      options.size = *size;
+    } else if (name == "--project") {
+      options.projectPath = value;
+    } else if (name == "--script") {
+      options.scriptPath = value;
+    } else {
+      options.outDir = value;
+    }
+  }
+  return options;
+}
+
+std::string ProgramOptions::Usage() {
+  return "usage: effectcontrols [--project FILE] [--size WxH] [--script FILE] [--out DIR] "
+         "[--headless]\n"
+         "  --project FILE  project to open (default: the built-in demo project)\n"
+         "  --size WxH      panel size in pixels (default 960x540)\n"
+         "  --script FILE   automation script to run; shots and dumps go under --out\n"
+         "  --out DIR       folder for shots, dumps and saves (default: the current folder)\n"
+         "  --headless      never open a window, even with a display\n";
+}

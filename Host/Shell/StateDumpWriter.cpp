@@ -1,0 +1,132 @@
+#include "Host/Shell/StateDumpWriter.h"
+
+#include <nlohmann/json.hpp>
+
+#include "Host/Messaging/Diagnostics.h"
+#include "Host/Model/Sequence.h"
+#include "Host/Model/TrackItem.h"
+#include "Host/Model/UndoStack.h"
+#include "Host/Shell/Application.h"
+#include "Host/Shell/StateDumpSource.h"
+#include "Host/Shell/WorkspaceFrame.h"
+#include "Host/Toolkit/TabView.h"
+#include "Host/Toolkit/ViewHost.h"
+
+namespace {
+
+using nlohmann::ordered_json;
+
+ordered_json RowJSON(const StateDumpRow& row) {
+  ordered_json j;
+  j["path"] = row.path;
+  j["class"] = row.className;
+  j["top"] = row.top;
+  j["height"] = row.height;
+  j["groupLevel"] = row.groupLevel;
+  j["expanded"] = row.expanded;
+  j["selected"] = row.selected;
+  j["setAside"] = row.setAside;
+  j["shown"] = row.shown;
+  return j;
+}
+
+ordered_json KeyframeAreaJSON(const StateDumpKeyframeArea& area) {
+  ordered_json j;
+  j["visibleStartTime"] = area.visibleStartTime;
+  j["secondsPerPixel"] = area.secondsPerPixel;
+  ordered_json keys = ordered_json::array();
+  for (const auto& key : area.selectedKeyframes)
+    keys.push_back({{"path", key.path}, {"time", key.time}});
+  j["selectedKeyframes"] = std::move(keys);
+  return j;
+}
+
+ordered_json PanelJSON(const TabView& tab) {
+  ordered_json j;
+  j["handler"] = tab.GetHandlerID();
+  j["name"] = tab.GetTabName();
+  const auto* source = dynamic_cast<const StateDumpSource*>(&tab);
+  j["dumped"] = source != nullptr;
+  if (source == nullptr)
+    return j;
+  PanelStateDump dump;
+  source->FillStateDump(dump);
+  j["header"] = dump.headerText;
+  j["targetMode"] = dump.targetMode;
+  ordered_json rows = ordered_json::array();
+  for (const auto& row : dump.rows)
+    rows.push_back(RowJSON(row));
+  j["rows"] = std::move(rows);
+  j["keyframeArea"] = dump.keyframeArea ? KeyframeAreaJSON(*dump.keyframeArea) : ordered_json();
+  ordered_json extra = ordered_json::object();
+  for (const auto& [key, value] : dump.extra)
+    std::visit([&, &k = key](const auto& v) { extra[k] = v; }, value);
+  j["extra"] = std::move(extra);
+  return j;
+}
+
+ordered_json SequenceJSON(const Sequence& sequence) {
+  ordered_json j;
+  j["id"] = sequence.GetID();
+  j["name"] = sequence.GetName();
+  j["currentTime"] = sequence.GetCurrentTime();
+  ordered_json groups = ordered_json::array();
+  for (const auto& group : sequence.GetSelection()) {
+    ordered_json ids = ordered_json::array();
+    for (const auto& item : group.videoItems)
+      ids.push_back(item->GetID());
+    for (const auto& item : group.audioItems)
+      ids.push_back(item->GetID());
+    groups.push_back(std::move(ids));
+  }
+  j["selection"] = std::move(groups);
+  return j;
+}
+
+}  // namespace
+
+std::string StateDumpWriter::Write(Application& application) {
+  ordered_json root;
+
+  WorkspaceFrame& frame = application.GetWorkspaceFrame();
+  ordered_json workspace;
+  const Size size = application.GetViewHost().GetSize();
+  workspace["width"] = size.width;
+  workspace["height"] = size.height;
+  workspace["maximized"] = frame.IsMaximized();
+  const TabView* front = frame.GetFrontTab();
+  workspace["frontTab"] = front != nullptr ? ordered_json(front->GetHandlerID()) : ordered_json();
+  ordered_json tabs = ordered_json::array();
+  for (const TabView* tab : frame.GetTabs())
+    tabs.push_back({{"handler", tab->GetHandlerID()}, {"name", tab->GetTabName()}});
+  workspace["tabs"] = std::move(tabs);
+  root["workspace"] = std::move(workspace);
+
+  const SequenceRef sequence = application.GetActiveSequence();
+  root["sequence"] = sequence != nullptr ? SequenceJSON(*sequence) : ordered_json();
+
+  ordered_json undo;
+  const UndoStack* stack = application.GetUndoStack();
+  undo["done"] = stack != nullptr ? stack->GetUndoNames() : std::vector<std::string>();
+  undo["undone"] = stack != nullptr ? stack->GetRedoNames() : std::vector<std::string>();
+  root["undo"] = std::move(undo);
+
+  ordered_json assertions = ordered_json::array();
+  for (const auto& record : RecordedDebugAssertions()) {
+    assertions.push_back({{"message", record.message},
+                          {"condition", record.condition},
+                          {"file", record.file},
+                          {"line", record.line},
+                          {"function", record.function},
+                          {"count", record.count}});
+  }
+  root["assertions"] = std::move(assertions);
+
+  ordered_json panels = ordered_json::array();
+  for (const TabView* tab : frame.GetTabs())
+    panels.push_back(PanelJSON(*tab));
+  root["panels"] = std::move(panels);
+
+  // Text that is not valid UTF-8 (a panel's row title) is replaced rather than failing the dump.
+  return root.dump(2, ' ', false, ordered_json::error_handler_t::replace) + "\n";
+}

@@ -1,0 +1,168 @@
+#include "Host/Shell/WorkspaceFrame.h"
+
+#include <algorithm>
+
+#include "Host/Messaging/Localization.h"
+#include "Host/Toolkit/DC.h"
+#include "Host/Toolkit/Font.h"
+#include "Host/Toolkit/TabView.h"
+
+namespace {
+
+constexpr Color kStripColor(38, 38, 38);
+constexpr Color kFrontLabelColor(58, 58, 58);
+constexpr Color kBackLabelColor(45, 45, 45);
+constexpr Color kFrontTextColor(230, 230, 230);
+constexpr Color kBackTextColor(150, 150, 150);
+constexpr Color kAccentColor(70, 130, 220);
+constexpr int kLabelPadding = 12;
+constexpr int kMaxLabelWidth = 220;
+
+}  // namespace
+
+WorkspaceFrame::WorkspaceFrame() = default;
+
+void WorkspaceFrame::AddTab(const std::shared_ptr<TabView>& tab, bool show) {
+  if (tab == nullptr)
+    return;
+  Prune();
+  const bool known = std::any_of(mTabs.begin(), mTabs.end(),
+                                 [&](const std::weak_ptr<TabView>& t) { return t.lock() == tab; });
+  if (!known)
+    mTabs.push_back(tab);
+  AddChild(tab);
+  LayOutTabs();
+  if (show || GetFrontTab() == nullptr) {
+    BringTabToFront(*tab, true, false);
+  } else {
+    tab->Hide();
+  }
+  InvalidateRect({0, 0, GetBounds().Width(), kTabStripHeight});
+}
+
+void WorkspaceFrame::BringTabToFront(TabView& tab, bool select, bool focus) {
+  if (tab.GetParent() != this)
+    return;
+  if (select) {
+    mFront = std::static_pointer_cast<TabView>(tab.shared_from_this());
+    for (TabView* other : GetTabs()) {
+      if (other != &tab)
+        other->Hide();
+    }
+    tab.Show();
+    InvalidateRect({0, 0, GetBounds().Width(), kTabStripHeight});
+  }
+  if (focus && tab.IsVisible())
+    tab.BecomeTarget();
+}
+
+void WorkspaceFrame::SetMaximized(bool maximized) {
+  if (maximized == mMaximized)
+    return;
+  mMaximized = maximized;
+  // Panels keep separate layouts for a maximised frame: let them lay out again at the same size.
+  for (TabView* tab : GetTabs()) {
+    tab->SetBoundsSelf(tab->GetBounds());
+    tab->Invalidate();
+  }
+}
+
+std::vector<TabView*> WorkspaceFrame::GetTabs() const {
+  std::vector<TabView*> tabs;
+  for (const auto& weak : mTabs) {
+    if (const auto tab = weak.lock(); tab != nullptr && tab->GetParent() == this)
+      tabs.push_back(tab.get());
+  }
+  return tabs;
+}
+
+TabView* WorkspaceFrame::GetFrontTab() const {
+  const auto front = mFront.lock();
+  return front != nullptr && front->GetParent() == this ? front.get() : nullptr;
+}
+
+TabView* WorkspaceFrame::FindTab(std::string_view handlerID) const {
+  for (TabView* tab : GetTabs()) {
+    if (tab->GetHandlerID() == handlerID)
+      return tab;
+  }
+  return nullptr;
+}
+
+Rect WorkspaceFrame::GetTabLabelRect(std::size_t index) const {
+  const Font font(kFont_Normal);
+  int left = 0;
+  const auto tabs = GetTabs();
+  for (std::size_t i = 0; i < tabs.size(); ++i) {
+    const int width =
+        std::min(kMaxLabelWidth,
+                 font.StringWidth(LocalizeString(tabs[i]->GetTabName())) + 2 * kLabelPadding);
+    if (i == index)
+      return {left, 0, left + width, kTabStripHeight};
+    left += width + 1;
+  }
+  return {};
+}
+
+Rect WorkspaceFrame::GetTabArea() const {
+  const Size size = GetSize();
+  return {0, std::min(kTabStripHeight, size.height), size.width, size.height};
+}
+
+void WorkspaceFrame::TabsChanged() {
+  Prune();
+  if (GetFrontTab() == nullptr) {
+    const auto tabs = GetTabs();
+    if (!tabs.empty())
+      BringTabToFront(*tabs.back(), true, true);
+  }
+  Invalidate();
+}
+
+void WorkspaceFrame::SetBoundsSelf(const Rect& /*bounds*/) {
+  LayOutTabs();
+}
+
+void WorkspaceFrame::PaintSelf(DC& dc) {
+  const Rect strip{0, 0, GetBounds().Width(), kTabStripHeight};
+  dc.FillRect(strip, kStripColor);
+  const Font font(kFont_Normal);
+  const TabView* front = GetFrontTab();
+  const auto tabs = GetTabs();
+  if (tabs.empty()) {
+    dc.DrawText(LocalizeString("$$$/Vantile/Host/Workspace/NoPanel=No panel is open"), GetTabArea(),
+                font, kBackTextColor, TextAlign::kCenter, TextVAlign::kCenter);
+  }
+  for (std::size_t i = 0; i < tabs.size(); ++i) {
+    const Rect label = GetTabLabelRect(i);
+    const bool isFront = tabs[i] == front;
+    dc.FillRect(label, isFront ? kFrontLabelColor : kBackLabelColor);
+    if (isFront)
+      dc.FillRect({label.left, 0, label.right, 2}, kAccentColor);
+    dc.DrawText(LocalizeString(tabs[i]->GetTabName()), label.Inset(kLabelPadding, 0), font,
+                isFront ? kFrontTextColor : kBackTextColor, TextAlign::kLeft, TextVAlign::kCenter);
+  }
+}
+
+void WorkspaceFrame::LeftButtonDownSelf(Point point, KeyModifiers /*modifiers*/) {
+  const auto tabs = GetTabs();
+  for (std::size_t i = 0; i < tabs.size(); ++i) {
+    if (GetTabLabelRect(i).Contains(point)) {
+      BringTabToFront(*tabs[i], true, true);
+      return;
+    }
+  }
+}
+
+void WorkspaceFrame::Prune() {
+  std::erase_if(mTabs, [this](const std::weak_ptr<TabView>& weak) {
+    const auto tab = weak.lock();
+    return tab == nullptr || tab->GetParent() != this;
+  });
+}
+
+void WorkspaceFrame::LayOutTabs() {
+  const Rect area = GetTabArea();
+  for (TabView* tab : GetTabs())
+    tab->SetBounds(area);
+}

@@ -1,0 +1,60 @@
+#include <gtest/gtest.h>
+
+#include <initializer_list>
+#include <vector>
+
+#include "Host/Shell/ProgramOptions.h"
+
+namespace {
+
+ProgramOptions::ParseResult ParseArgs(std::initializer_list<std::string_view> args) {
+  const std::vector<std::string_view> list(args);
+  return ProgramOptions::Parse(list);
+}
+
+std::string ErrorOf(const ProgramOptions::ParseResult& result) {
+  const auto* error = std::get_if<std::string>(&result);
+  return error ? *error : std::string("(parsed)");
+}
+
+TEST(ProgramOptions, DefaultsWithoutArguments) {
+  const auto options = std::get<ProgramOptions>(ParseArgs({}));
+  EXPECT_TRUE(options.projectPath.empty());
+  EXPECT_EQ(options.size, ProgramOptions::kDefaultSize);
+  EXPECT_TRUE(options.scriptPath.empty());
+  EXPECT_EQ(options.outDir, ".");
+  EXPECT_FALSE(options.headless);
+}
+
+TEST(ProgramOptions, ReadsEveryOptionInBothForms) {
+  const auto options = std::get<ProgramOptions>(ParseArgs(
+      {"--project", "a b.json", "--size=800x600", "--script", "s.txt", "--out=o", "--headless"}));
+  EXPECT_EQ(options.projectPath, "a b.json");
+  EXPECT_EQ(options.size, (Size{800, 600}));
+  EXPECT_EQ(options.scriptPath, "s.txt");
+  EXPECT_EQ(options.outDir, "o");
+  EXPECT_TRUE(options.headless);
+}
+
+TEST(ProgramOptions, RejectsMalformedSizes) {
+  for (auto bad : {"800", "800x", "x600", "0x600", "800x-1", "800x600x2", "20000x10", "8OOx600"}) {
+    EXPECT_NE(ErrorOf(ParseArgs({"--size", bad})).find("--size needs WxH"), std::string::npos)
+        << bad;
+  }
+}
+
+TEST(ProgramOptions, NamesTheOffendingArgument) {
+  EXPECT_EQ(ErrorOf(ParseArgs({"--projct", "x"})), "unknown option '--projct'");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--script"})), "--script needs a value");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--out="})), "--out needs a value");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--project", "a", "--project", "b"})), "--project given twice");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--headless=yes"})), "--headless takes no value");
+  EXPECT_EQ(ErrorOf(ParseArgs({"stray.json"})), "unknown option 'stray.json'");
+}
+
+TEST(ProgramOptions, HelpIsRecognised) {
+  EXPECT_TRUE(std::get<ProgramOptions>(ParseArgs({"--help"})).help);
+  EXPECT_NE(ProgramOptions::Usage().find("--headless"), std::string::npos);
+}
+
+}  // namespace
