@@ -284,10 +284,13 @@ void DC::FrameRect(const Rect& rect, Color color, int width) {
     };
     FillRect({c(x0), c(y0), c(x1), c(y1)}, color);
   };
+  // The sides never overlap, so translucent frames blend each pixel once.
+  const std::int64_t bottomTop = std::max(b - w, t + w);
+  const std::int64_t rightLeft = std::max(r - w, l + w);
   fill(l, t, r, t + w);
-  fill(l, b - w, r, b);
-  fill(l, t + w, l + w, b - w);
-  fill(r - w, t + w, r, b - w);
+  fill(l, bottomTop, r, b);
+  fill(l, t + w, l + w, bottomTop);
+  fill(rightLeft, t + w, r, bottomTop);
 }
 
 void DC::DrawLine(Point from, Point to, Color color, int width) {

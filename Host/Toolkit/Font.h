@@ -55,8 +55,6 @@ class Font {
   static std::size_t CachedLayoutCount();
   static void ClearLayoutCache();
 
-  int GetFaceIndex() const { return mFace; }
-
  private:
   int mFace = 0;  // index into the process-wide face table
 };

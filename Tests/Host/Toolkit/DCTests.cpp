@@ -55,6 +55,15 @@ TEST(DCFill, FrameRectDrawsOnlyTheBorder) {
   EXPECT_EQ(CountChangedInside(image, {0, 0, 10, 10}, kTestBackground), 8 * 4 - 4);
 }
 
+TEST(DCFill, TranslucentFramesOfThinRectsBlendEachPixelOnce) {
+  Image image = MakeCanvas({10, 10}, Color(255, 255, 255));
+  DC dc(image);
+  dc.FrameRect({1, 1, 9, 2}, Color(0, 0, 0, 128), 2);  // one pixel high: top and bottom coincide
+  dc.FrameRect({1, 4, 2, 9}, Color(0, 0, 0, 128), 2);  // one pixel wide
+  EXPECT_TRUE(NearColor(image.GetPixel(4, 1), Color(127, 127, 127), 1));
+  EXPECT_TRUE(NearColor(image.GetPixel(1, 6), Color(127, 127, 127), 1));
+}
+
 TEST(DCLine, HorizontalAndVerticalLinesEndBeforeTheirEndPoint) {
   Image image = MakeCanvas({20, 20}, kTestBackground);
   DC dc(image);
