@@ -550,7 +550,7 @@ void DC::DrawImage(const Image& image, Point topLeft, double alpha) {
   const double y = static_cast<double>(topLeft.y);
   const double w = pixels.width / imageScale;
   const double h = pixels.height / imageScale;
-  if (mCairo == nullptr || alpha <= 0.0)
+  if (mCairo == nullptr || !(alpha > 0.0))
     return;
   const Rect clip = ClipInTarget();
   const double ax = x + mOrigin.x;
@@ -573,7 +573,7 @@ void DC::DrawImage(const Image& image, Point topLeft, double alpha) {
 }
 
 void DC::DrawImage(const Image& image, const Rect& dest, double alpha) {
-  if (mCairo == nullptr || image.IsEmpty() || dest.IsEmpty() || alpha <= 0.0)
+  if (mCairo == nullptr || image.IsEmpty() || dest.IsEmpty() || !(alpha > 0.0))
     return;
   const RectL abs{std::int64_t{dest.left} + mOrigin.x, std::int64_t{dest.top} + mOrigin.y,
                   std::int64_t{dest.right} + mOrigin.x, std::int64_t{dest.bottom} + mOrigin.y};

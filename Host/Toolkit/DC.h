@@ -100,7 +100,8 @@ class DC {
   // One line with its top-left at `topLeft`, clipped only by the clip box.
   void DrawTextAt(std::string_view text, Point topLeft, const Font& font, Color color);
 
-  // Images draw at their logical size; one made for another scale is resampled.
+  // Images draw at their logical size; one made for another scale is resampled. `alpha` is
+  // clamped to [0, 1]; NaN draws nothing.
   void DrawImage(const Image& image, Point topLeft, double alpha = 1.0);
   void DrawImage(const Image& image, const Rect& dest, double alpha = 1.0);
   void DrawBitmap(const Bitmap& bitmap, Point topLeft, double alpha = 1.0);

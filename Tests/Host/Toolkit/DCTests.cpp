@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <array>
+#include <limits>
 #include <vector>
 
 #include "Host/Messaging/Diagnostics.h"
@@ -417,6 +418,9 @@ TEST(DCImages, StretchedImagesFillTheirRect) {
   Image small = MakeCanvas({2, 2}, kTestRed);
   Image image = MakeCanvas({20, 20}, kTestBackground);
   DC dc(image);
+  dc.DrawImage(small, Rect{0, 0, 4, 4}, std::numeric_limits<double>::quiet_NaN());
+  dc.DrawImage(small, Point{0, 0}, -1.0);
+  EXPECT_EQ(image.GetPixel(0, 0), kTestBackground);
   dc.DrawImage(small, Rect{5, 5, 15, 15});
   EXPECT_EQ(image.GetPixel(5, 5), kTestRed);
   EXPECT_EQ(image.GetPixel(14, 14), kTestRed);
