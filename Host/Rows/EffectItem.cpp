@@ -193,11 +193,11 @@ void EffectItem::PositionSelf(int top, int depth, int width) {
     const Point at = GetDisclosureTrianglePosition();
     PlaceView(*mTriangle, Rect::FromSize(at.x, top + at.y, kTriangleSize, kTriangleSize));
   }
-  PositionChildren(top + OwnHeight(), depth + 1, width);
+  PositionChildren(top + OwnHeight() + (mExpanded ? GetExpandedAreaHeight() : 0), depth + 1, width);
 }
 
 int EffectItem::Height() const {
-  return OwnHeight() + (mExpanded ? ChildrenHeight() : 0);
+  return OwnHeight() + (mExpanded ? GetExpandedAreaHeight() + ChildrenHeight() : 0);
 }
 
 void EffectItem::SetViewTopAndBottom(int viewTop, int viewBottom) {

@@ -156,11 +156,13 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   // its own depth + 1). The base places the triangle and lays the visible children out under
   // the row's own band.
   virtual void PositionSelf(int top, int depth, int width);
-  // The row's own band plus, while expanded, the heights of its children that are not set
-  // aside. A set-aside row still answers its height; callers skip it.
+  // The row's own band plus, while expanded, its expanded area and the heights of its children
+  // that are not set aside. A set-aside row still answers its height; callers skip it.
   virtual int Height() const;
   // The row's own band (title, and controls shown beside it).
   virtual int OwnHeight() const { return IsFolder() ? kFolderTitleHeight : kParameterRowHeight; }
+  // What an expanded row shows between its band and its children (a slider, graphs).
+  virtual int GetExpandedAreaHeight() const { return 0; }
   int GetTop() const { return mTop; }
   int GetWidth() const { return mWidth; }
   int GetDepth() const { return mDepth; }
