@@ -3,7 +3,7 @@ add_library(ec_options INTERFACE)
 target_compile_options(ec_options INTERFACE
   -Wall -Wextra -Wpedantic -Werror
   -Wshadow -Wnon-virtual-dtor -Woverloaded-virtual -Wcast-align
-  -Wnull-dereference -Wimplicit-fallthrough -Wmissing-declarations)
+  -Wimplicit-fallthrough -Wmissing-declarations)
 target_include_directories(ec_options INTERFACE ${PROJECT_SOURCE_DIR})
 
 if(EC_SANITIZE)
