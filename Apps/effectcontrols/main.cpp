@@ -18,9 +18,13 @@
 #include "Host/Shell/DemoProject.h"
 #include "Host/Shell/ProgramOptions.h"
 #include "Host/Shell/ScriptRunner.h"
+#include "Host/Shell/Sdl/SdlInputBox.h"
+#include "Host/Shell/Sdl/SdlMenuTracker.h"
 #include "Host/Shell/Sdl/SdlWindow.h"
 #include "Host/Shell/ViewHostInputRoute.h"
 #include "Host/Toolkit/Image.h"
+#include "Host/Toolkit/InputBox.h"
+#include "Host/Toolkit/MenuTracker.h"
 #include "Host/Toolkit/ViewHost.h"
 
 namespace {
@@ -85,7 +89,12 @@ int Run(const ProgramOptions& options) {
     if (window == nullptr)
       return Fail(kExitCannotStart, "cannot open a window (" + error + "); use --headless");
     if (!script) {
+      // Popup menus and input boxes appear over the window.
+      const auto previousMenus = SetMenuTracker(std::make_shared<SdlMenuTracker>(*window));
+      const auto previousBoxes = InputBox::SetResponder(std::make_shared<SdlInputBox>(*window));
       window->Run();
+      SetMenuTracker(previousMenus);
+      InputBox::SetResponder(previousBoxes);
       return EXIT_SUCCESS;
     }
     int exitCode = EXIT_SUCCESS;

@@ -14,6 +14,7 @@
 #include "Host/Shell/Module.h"
 #include "Host/Shell/ShellMessages.h"
 #include "Host/Shell/WorkspaceFrame.h"
+#include "Host/Toolkit/StandardCommands.h"
 #include "Host/Toolkit/TabView.h"
 #include "Host/Toolkit/ViewHost.h"
 
@@ -34,14 +35,49 @@ void BroadcastToolMessage() {
   BroadcastMessage(kToolStation, M());
 }
 
+// Undo and redo of the open project, for the keys and menus of every panel.
+class EditCommands : public CommandHandler {
+ public:
+  explicit EditCommands(Application& application) : mApplication(application) {}
+
+  bool FindCommandStatus(CommandID command, CommandStatus& status) override {
+    if (command != kCommandUndo && command != kCommandRedo)
+      return false;
+    const UndoStack* stack = mApplication.GetUndoStack();
+    const bool undo = command == kCommandUndo;
+    status = CommandStatus{};
+    status.enabled = stack != nullptr && !stack->IsPerformingUndoOrRedo() &&
+                     (undo ? stack->CanUndo() : stack->CanRedo());
+    if (status.enabled)
+      status.text =
+          (undo ? "Undo " : "Redo ") + (undo ? stack->GetUndoName() : stack->GetRedoName());
+    return true;
+  }
+
+  bool ObeyCommand(CommandID command) override {
+    if (command != kCommandUndo && command != kCommandRedo)
+      return false;
+    UndoStack* stack = mApplication.GetUndoStack();
+    if (stack != nullptr)
+      command == kCommandUndo ? stack->Undo() : stack->Redo();
+    return true;
+  }
+
+ private:
+  Application& mApplication;  // owns this handler
+};
+
 }  // namespace
 
 Application::Application(Size workspaceSize)
     : mViewHost(std::make_unique<ViewHost>(workspaceSize)),
-      mFrame(std::make_shared<WorkspaceFrame>()) {
-  if (HOST_VERIFY(gInstance == nullptr, "There is one Application per process"))
-    gInstance = this;
+      mFrame(std::make_shared<WorkspaceFrame>()),
+      mEditCommands(std::make_unique<EditCommands>(*this)) {
   mViewHost->SetRootView(mFrame);
+  if (HOST_VERIFY(gInstance == nullptr, "There is one Application per process")) {
+    gInstance = this;
+    CommandHandler::RegisterFallbackHandler(*mEditCommands);
+  }
 }
 
 Application::~Application() {

@@ -16,6 +16,7 @@
 #include "Host/Toolkit/CommandStatus.h"
 #include "Host/Toolkit/Geometry.h"
 
+class CommandHandler;
 class Handler;
 class Module;
 class TabView;
@@ -136,7 +137,8 @@ class Application {
   HostTool GetTool() const { return mTool; }
 
   // --- Commands ---
-  // From the focused view up its chain, then to the handlers. True when handled.
+  // From the focused view up its chain, then to the fallbacks: the application's own (undo and
+  // redo through the open project's history), then the handlers. True when handled.
   bool DoCommand(CommandID command);
   // As the chain and the handlers report it; while menus are disabled the handlers adjust it.
   CommandStatus GetCommandStatus(CommandID command);
@@ -166,4 +168,5 @@ class Application {
   std::vector<SequenceRef> mOpenedSequences;
   HostTool mTool = HostTool::kPointer;
   bool mMenusDisabled = false;
+  std::unique_ptr<CommandHandler> mEditCommands;  // undo and redo
 };

@@ -10,7 +10,9 @@
 #include "Host/Messaging/MessageLoop.h"
 #include "Host/Shell/ScriptInputRoute.h"
 #include "Host/Shell/Sdl/SdlKeyMap.h"
+#include "Host/Shell/Sdl/SdlModal.h"
 #include "Host/Toolkit/Cursor.h"
+#include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Image.h"
 #include "Host/Toolkit/Region.h"
 #include "Host/Toolkit/ViewHost.h"
@@ -52,6 +54,10 @@ SDL_SystemCursor SystemCursorFor(Cursor cursor) {
     default:
       return SDL_SYSTEM_CURSOR_ARROW;
   }
+}
+
+Uint32 ButtonBit(Uint8 sdlButton) {
+  return 1u << (sdlButton & 31u);
 }
 
 MouseButton ButtonFromSdl(Uint8 button) {
@@ -187,6 +193,8 @@ struct SdlWindow::Impl {
     }
     if (texture != nullptr)
       SDL_DestroyTexture(texture);
+    if (overlay != nullptr)
+      SDL_DestroyTexture(overlay);
     if (renderer != nullptr)
       SDL_DestroyRenderer(renderer);
     if (window != nullptr)
@@ -274,7 +282,93 @@ struct SdlWindow::Impl {
       return;
     SDL_RenderClear(renderer);
     SDL_RenderCopy(renderer, texture, nullptr, nullptr);
+    if (modal != nullptr)
+      DrawModal();
     SDL_RenderPresent(renderer);
+    modalDirty = false;
+  }
+
+  // Paints the modal into its own texture and draws it over the frame.
+  void DrawModal() {
+    const Rect bounds = modal->GetBounds(host.GetSize());
+    if (bounds.IsEmpty())
+      return;
+    Image image(bounds.GetSize());
+    if (image.IsEmpty())
+      return;
+    {
+      DC dc(image);
+      modal->Paint(dc);
+    }
+    const Size pixels = image.GetPixelSize();
+    if (overlay == nullptr || !(overlaySize == pixels)) {
+      if (overlay != nullptr)
+        SDL_DestroyTexture(overlay);
+      overlay = SDL_CreateTexture(renderer, SDL_PIXELFORMAT_ARGB8888, SDL_TEXTUREACCESS_STREAMING,
+                                  pixels.width, pixels.height);
+      if (overlay == nullptr)
+        return;
+      SDL_SetTextureBlendMode(overlay, SDL_BLENDMODE_BLEND);
+      overlaySize = pixels;
+    }
+    SDL_UpdateTexture(overlay, nullptr, image.GetData(), image.GetStride());
+    const SDL_Rect where{bounds.left, bounds.top, bounds.Width(), bounds.Height()};
+    SDL_RenderCopy(renderer, overlay, nullptr, &where);
+  }
+
+  // Events while a modal runs: everything goes to it.
+  void HandleModal(const SDL_Event& event) {
+    switch (event.type) {
+      case SDL_MOUSEBUTTONDOWN:
+      case SDL_MOUSEBUTTONUP:
+        if (event.button.windowID != windowID || event.button.which == SDL_TOUCH_MOUSEID)
+          return;
+        lastMouse = {event.button.x, event.button.y};
+        if (event.type == SDL_MOUSEBUTTONDOWN) {
+          // Its release belongs to the modal too, even when it arrives after the modal ended.
+          modalButtons |= ButtonBit(event.button.button);
+          modal->MouseDown(ButtonFromSdl(event.button.button), lastMouse);
+        } else {
+          modalButtons &= ~ButtonBit(event.button.button);
+          modal->MouseUp(ButtonFromSdl(event.button.button), lastMouse);
+        }
+        break;
+      case SDL_MOUSEMOTION:
+        if (event.motion.windowID != windowID || event.motion.which == SDL_TOUCH_MOUSEID)
+          return;
+        lastMouse = {event.motion.x, event.motion.y};
+        modal->MouseMove(lastMouse);
+        break;
+      case SDL_KEYDOWN:
+        if (event.key.windowID != windowID || IsSdlModifierKey(event.key.keysym.sym))
+          return;
+        if (const auto key = KeyCodeFromSdlKey(event.key.keysym.sym)) {
+          KeyEvent keyEvent;
+          keyEvent.key = *key;
+          keyEvent.modifiers = KeyModifiersFromSdl(event.key.keysym.mod);
+          keyEvent.isRepeat = event.key.repeat != 0;
+          modal->KeyDown(keyEvent);
+        }
+        break;
+      case SDL_TEXTINPUT:
+        if (event.text.windowID == windowID)
+          modal->TextInput(event.text.text);
+        break;
+      default:
+        return;
+    }
+    modalDirty = true;
+  }
+
+  bool RunModal(SdlModal& newModal) {
+    SdlModal* const previous = modal;
+    modal = &newModal;
+    modalDirty = true;
+    while (!newModal.IsDone() && !closed)
+      Pump(20);
+    modal = previous;
+    ShowFrame();
+    return !closed;
   }
 
   void ShowCursorShape(Cursor cursor) {
@@ -295,6 +389,10 @@ struct SdlWindow::Impl {
   KeyModifiers CurrentModifiers() const { return KeyModifiersFromSdl(SDL_GetModState()); }
 
   void Handle(const SDL_Event& event) {
+    if (modal != nullptr && event.type != SDL_QUIT && event.type != SDL_WINDOWEVENT) {
+      HandleModal(event);
+      return;
+    }
     switch (event.type) {
       case SDL_QUIT:
         closed = true;
@@ -323,6 +421,11 @@ struct SdlWindow::Impl {
       case SDL_MOUSEBUTTONUP: {
         if (event.button.windowID != windowID || event.button.which == SDL_TOUCH_MOUSEID)
           break;
+        if (event.type == SDL_MOUSEBUTTONUP &&
+            (modalButtons & ButtonBit(event.button.button)) != 0) {
+          modalButtons &= ~ButtonBit(event.button.button);
+          break;
+        }
         const Point point{event.button.x, event.button.y};
         lastMouse = point;
         const MouseButton button = ButtonFromSdl(event.button.button);
@@ -388,7 +491,8 @@ struct SdlWindow::Impl {
       Handle(event);
     }
     auto& loop = MessageLoop::Instance();
-    if (!gotEvent && timeoutMs > 0 && !loop.HasPending() && host.GetDirtyRegion().IsEmpty()) {
+    if (!gotEvent && timeoutMs > 0 && !loop.HasPending() && host.GetDirtyRegion().IsEmpty() &&
+        !modalDirty) {
       if (SDL_WaitEventTimeout(&event, timeoutMs) != 0) {
         Handle(event);
         while (SDL_PollEvent(&event) != 0)
@@ -398,6 +502,8 @@ struct SdlWindow::Impl {
     loop.RunPending();
     if (!host.GetDirtyRegion().IsEmpty())
       host.Render();
+    else if (modal != nullptr && modalDirty)
+      ShowFrame();
     return !closed;
   }
 
@@ -409,6 +515,11 @@ struct SdlWindow::Impl {
   SDL_Renderer* renderer = nullptr;
   SDL_Texture* texture = nullptr;
   Size textureSize;
+  SdlModal* modal = nullptr;  // not owned; the innermost RunModal's
+  Uint32 modalButtons = 0;    // buttons pressed while a modal ran, until their release
+  bool modalDirty = false;
+  SDL_Texture* overlay = nullptr;
+  Size overlaySize;
   std::array<SDL_Cursor*, SDL_NUM_SYSTEM_CURSORS> cursors{};
   Point lastMouse;
   bool closed = false;
@@ -447,8 +558,16 @@ void SdlWindow::RequestClose() {
   SDL_PushEvent(&event);
 }
 
+bool SdlWindow::RunModal(SdlModal& modal) {
+  return mImpl->RunModal(modal);
+}
+
 ScriptInputRoute& SdlWindow::GetInputRoute() {
   return mImpl->route;
+}
+
+std::uint32_t SdlWindow::GetWindowID() const {
+  return mImpl->windowID;
 }
 
 Size SdlWindow::GetSize() const {
@@ -467,6 +586,8 @@ Image SdlWindow::ReadBack() const {
   // The back buffer's content after a present is undefined: draw the frame again first.
   SDL_RenderClear(mImpl->renderer);
   SDL_RenderCopy(mImpl->renderer, mImpl->texture, nullptr, nullptr);
+  if (mImpl->modal != nullptr)
+    mImpl->DrawModal();
   if (SDL_RenderReadPixels(mImpl->renderer, nullptr, SDL_PIXELFORMAT_ARGB8888, image.GetData(),
                            image.GetStride()) != 0) {
     return Image();

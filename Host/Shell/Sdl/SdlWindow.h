@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <string>
 
@@ -7,6 +8,7 @@
 
 class Image;
 class ScriptInputRoute;
+class SdlModal;
 class ViewHost;
 
 // The interactive front end: an SDL2 window that shows a view host's image and feeds it the
@@ -35,6 +37,10 @@ class SdlWindow {
   // Queues the window's close event, as the window manager's close button does.
   void RequestClose();
 
+  // Shows `modal` over the window and gives it every event until it is done (a nested loop:
+  // posted messages and repaints go on meanwhile). False when the window was closed first.
+  bool RunModal(SdlModal& modal);
+
   // Input sent through SDL's event queue, so that it takes the same path as the user's; each
   // call returns once the event has been handled. Owned by the window.
   ScriptInputRoute& GetInputRoute();
@@ -42,6 +48,8 @@ class SdlWindow {
   // What the window shows now, read back from the renderer (an empty image on failure).
   Image ReadBack() const;
   Size GetSize() const;
+  // SDL's id of the window (events carry it).
+  std::uint32_t GetWindowID() const;
 
  private:
   struct Impl;

@@ -9,6 +9,7 @@
 #include "Host/Messaging/MessagingTestScope.h"
 #include "Host/Messaging/PropertyList.h"
 #include "Host/Messaging/Station.h"
+#include "Host/Model/FunctionAction.h"
 #include "Host/Model/ModelMessages.h"
 #include "Host/Model/Project.h"
 #include "Host/Model/Sequence.h"
@@ -19,6 +20,7 @@
 #include "Host/Shell/Module.h"
 #include "Host/Shell/ShellMessages.h"
 #include "Host/Shell/WorkspaceFrame.h"
+#include "Host/Toolkit/StandardCommands.h"
 #include "Host/Toolkit/TabView.h"
 #include "Host/Toolkit/ViewHost.h"
 
@@ -422,6 +424,30 @@ TEST_F(ApplicationTest, ToolsAndOpenedSelectionsAreBroadcast) {
   app.OpenProject(BuildDemoProject());
   app.OpenTrackItemSelection({app.GetActiveSequence()->FindTrackItem(kDemoTransition)});
   EXPECT_EQ(activation.names, std::vector<std::string>{"TrackItemSelectionOpenedMessage"});
+}
+
+TEST_F(ApplicationTest, UndoAndRedoKeysWorkOnTheOpenProject) {
+  RegisterHandler("Test.H1");
+  Application app;
+  app.CreateHandlers();
+  EXPECT_FALSE(app.GetCommandStatus(kCommandUndo).enabled) << "no project";
+  app.OpenProject(BuildDemoProject());
+  int value = 0;
+  app.GetUndoStack()->Execute(
+      FunctionAction::MakeSetter("Test.Set", 0, 5, [&value](int v) { value = v; }));
+  ASSERT_EQ(value, 5);
+  const CommandStatus status = app.GetCommandStatus(kCommandUndo);
+  EXPECT_TRUE(status.enabled);
+  EXPECT_EQ(status.text, "Undo Test.Set");
+  EXPECT_FALSE(app.GetCommandStatus(kCommandRedo).enabled);
+
+  ViewHost& host = app.GetViewHost();
+  EXPECT_TRUE(host.KeyDown({KeyCode::kZ, kKeyModifierCtrl}));
+  EXPECT_EQ(value, 0);
+  EXPECT_TRUE(app.DoCommand(kCommandRedo));
+  EXPECT_EQ(value, 5);
+  app.SetMenusDisabled(true);
+  EXPECT_FALSE(app.GetCommandStatus(kCommandUndo).enabled) << "handlers disable it";
 }
 
 TEST_F(ApplicationTest, ShutdownDeletesHandlersBeforeModulesWhileTheInstanceLives) {

@@ -1,3 +1,4 @@
+#include <SDL.h>
 #include <gtest/gtest.h>
 
 #include <cstdlib>
@@ -7,6 +8,8 @@
 
 #include "Host/Messaging/MessagingTestScope.h"
 #include "Host/Shell/ScriptInputRoute.h"
+#include "Host/Shell/Sdl/SdlInputBox.h"
+#include "Host/Shell/Sdl/SdlMenuTracker.h"
 #include "Host/Shell/Sdl/SdlWindow.h"
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Image.h"
@@ -72,6 +75,45 @@ class SdlWindowTest : public ::testing::Test {
     mWindow->Pump(0);
   }
 
+  // Queues input for a modal loop that has not started yet.
+  void QueueMouse(Uint32 type, int x, int y) {
+    SDL_Event event{};
+    event.type = type;
+    if (type == SDL_MOUSEMOTION) {
+      event.motion.windowID = mWindow->GetWindowID();
+      event.motion.x = x;
+      event.motion.y = y;
+    } else {
+      event.button.windowID = mWindow->GetWindowID();
+      event.button.button = SDL_BUTTON_LEFT;
+      event.button.state = type == SDL_MOUSEBUTTONDOWN ? SDL_PRESSED : SDL_RELEASED;
+      event.button.clicks = 1;
+      event.button.x = x;
+      event.button.y = y;
+    }
+    SDL_PushEvent(&event);
+  }
+  void QueueClick(int x, int y) {
+    QueueMouse(SDL_MOUSEMOTION, x, y);
+    QueueMouse(SDL_MOUSEBUTTONDOWN, x, y);
+    QueueMouse(SDL_MOUSEBUTTONUP, x, y);
+  }
+  void QueueKey(SDL_Keycode key) {
+    SDL_Event event{};
+    event.type = SDL_KEYDOWN;
+    event.key.windowID = mWindow->GetWindowID();
+    event.key.state = SDL_PRESSED;
+    event.key.keysym.sym = key;
+    SDL_PushEvent(&event);
+  }
+  void QueueText(const char* text) {
+    SDL_Event event{};
+    event.type = SDL_TEXTINPUT;
+    event.text.windowID = mWindow->GetWindowID();
+    SDL_strlcpy(event.text.text, text, sizeof(event.text.text));
+    SDL_PushEvent(&event);
+  }
+
   bool Has(const std::string& event) const {
     for (const auto& e : mView->events) {
       if (e == event)
@@ -81,16 +123,16 @@ class SdlWindowTest : public ::testing::Test {
   }
 
   MessagingTestScope mMessaging;
-  ViewHost mHost{Size{160, 100}};
+  ViewHost mHost{Size{240, 200}};
   std::shared_ptr<RecordingView> mView;
   std::unique_ptr<SdlWindow> mWindow;
 };
 
 TEST_F(SdlWindowTest, ShowsTheRenderedImage) {
   const Image shown = mWindow->ReadBack();
-  ASSERT_EQ(shown.GetPixelSize(), (Size{160, 100}));
+  ASSERT_EQ(shown.GetPixelSize(), (Size{240, 200}));
   EXPECT_EQ(shown.GetPixel(10, 50), kLeftColor);
-  EXPECT_EQ(shown.GetPixel(150, 50), kRightColor);
+  EXPECT_EQ(shown.GetPixel(230, 50), kRightColor);
 }
 
 TEST_F(SdlWindowTest, RepaintsWhatWasInvalidated) {
@@ -139,18 +181,109 @@ TEST_F(SdlWindowTest, DeliversKeysAndText) {
 }
 
 TEST_F(SdlWindowTest, ResizeReachesTheViewTree) {
-  mWindow->GetInputRoute().Resize({240, 120});
-  EXPECT_EQ(mHost.GetSize(), (Size{240, 120}));
-  EXPECT_EQ(mView->GetBounds(), Rect::FromSize(0, 0, 240, 120));
+  mWindow->GetInputRoute().Resize({320, 150});
+  EXPECT_EQ(mHost.GetSize(), (Size{320, 150}));
+  EXPECT_EQ(mView->GetBounds(), Rect::FromSize(0, 0, 320, 150));
   const Image shown = mWindow->ReadBack();
-  ASSERT_EQ(shown.GetPixelSize(), (Size{240, 120}));
-  EXPECT_EQ(shown.GetPixel(230, 110), kRightColor);
+  ASSERT_EQ(shown.GetPixelSize(), (Size{320, 150}));
+  EXPECT_EQ(shown.GetPixel(310, 140), kRightColor);
 }
 
 TEST_F(SdlWindowTest, ClosingTheWindowEndsTheLoop) {
   EXPECT_TRUE(mWindow->Pump(0));
   mWindow->RequestClose();
   EXPECT_FALSE(mWindow->Pump(0));
+  EXPECT_TRUE(mWindow->IsClosed());
+}
+
+// One, separator, Two (disabled), Three, More > Four; opened at (10, 10).
+PopupMenuRequest SampleMenu() {
+  auto command = [](CommandID id, const char* text, bool enabled) {
+    PopupMenuEntry entry;
+    entry.command = id;
+    entry.text = text;
+    entry.enabled = enabled;
+    return entry;
+  };
+  PopupMenuRequest request;
+  request.menuName = "Sample";
+  request.windowPoint = {10, 10};
+  request.entries.push_back(command(1, "One", true));
+  PopupMenuEntry separator;
+  separator.kind = MenuItem::Kind::kSeparator;
+  request.entries.push_back(separator);
+  request.entries.push_back(command(2, "Two", false));
+  request.entries.push_back(command(3, "Three", true));
+  PopupMenuEntry more;
+  more.kind = MenuItem::Kind::kSubmenu;
+  more.text = "More";
+  more.submenu.push_back(command(4, "Four", true));
+  request.entries.push_back(more);
+  return request;
+}
+
+// Vertical centre of entry rows in SampleMenu (separator rows are shorter).
+int RowCenter(int row) {
+  const int rows[] = {0, SdlMenuTracker::kItemHeight,
+                      SdlMenuTracker::kItemHeight + SdlMenuTracker::kSeparatorHeight,
+                      2 * SdlMenuTracker::kItemHeight + SdlMenuTracker::kSeparatorHeight,
+                      3 * SdlMenuTracker::kItemHeight + SdlMenuTracker::kSeparatorHeight};
+  return 10 + SdlMenuTracker::kPadding + rows[row] + SdlMenuTracker::kItemHeight / 2;
+}
+
+TEST_F(SdlWindowTest, PopupMenusChooseEnabledCommandsWithThePointer) {
+  SdlMenuTracker tracker(*mWindow);
+  const PopupMenuRequest menu = SampleMenu();
+  mWindow->Pump(0);
+  mView->events.clear();  // the system pointer may enter the window first
+  QueueClick(40, RowCenter(3));
+  EXPECT_EQ(tracker.TrackPopupMenu(menu), 3);
+
+  QueueClick(40, RowCenter(2));  // disabled: the menu stays open
+  QueueKey(SDLK_ESCAPE);
+  EXPECT_EQ(tracker.TrackPopupMenu(menu), std::nullopt);
+
+  QueueClick(230, 190);  // outside
+  EXPECT_EQ(tracker.TrackPopupMenu(menu), std::nullopt);
+  for (const auto& event : mView->events) {
+    EXPECT_NE(event.rfind("down", 0), 0u) << "the view got a press meant for the menu";
+    EXPECT_NE(event.rfind("up", 0), 0u) << "the view got a release meant for the menu";
+  }
+}
+
+TEST_F(SdlWindowTest, PopupMenusOpenSubmenusAndFollowTheKeys) {
+  SdlMenuTracker tracker(*mWindow);
+  const PopupMenuRequest menu = SampleMenu();
+  QueueMouse(SDL_MOUSEMOTION, 40, RowCenter(4));  // hover "More": the submenu opens beside it
+  QueueKey(SDLK_RIGHT);
+  QueueKey(SDLK_RETURN);
+  EXPECT_EQ(tracker.TrackPopupMenu(menu), 4);
+
+  QueueKey(SDLK_DOWN);  // One
+  QueueKey(SDLK_DOWN);  // skips the separator and the disabled Two
+  QueueKey(SDLK_RETURN);
+  EXPECT_EQ(tracker.TrackPopupMenu(menu), 3);
+}
+
+TEST_F(SdlWindowTest, InputBoxesEditAndAnswer) {
+  SdlInputBox box(*mWindow);
+  const InputBoxRequest request{"Rename Item", "New Name", "Blur"};
+  QueueText(" 2x");
+  QueueKey(SDLK_BACKSPACE);
+  QueueText("\xC3\xA9");
+  QueueKey(SDLK_BACKSPACE);  // a whole two-byte character
+  QueueKey(SDLK_RETURN);
+  EXPECT_EQ(box.Answer(request), "Blur 2");
+
+  QueueText("gone");
+  QueueKey(SDLK_ESCAPE);
+  EXPECT_EQ(box.Answer(request), std::nullopt);
+}
+
+TEST_F(SdlWindowTest, ClosingTheWindowCancelsAModal) {
+  SdlInputBox box(*mWindow);
+  mWindow->RequestClose();
+  EXPECT_EQ(box.Answer({"Title", "Prompt", "x"}), std::nullopt);
   EXPECT_TRUE(mWindow->IsClosed());
 }
 
