@@ -160,6 +160,8 @@ void EffectItem::SetIsExpanded(bool expanded) {
   if (!mShown) {
     return;
   }
+  // Rows show some controls only while expanded (a slider under the value).
+  ShowControls(true);
   if (expanded) {
     ShowChildren();
   } else {

@@ -206,7 +206,8 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   virtual bool UpdateParameterUI() { return UpdateSetAside(); }
   virtual void SynchToTime(bool /*force*/) {}
 
-  // Shows or hides the row's own controls (not the children); called by Show and Hide.
+  // Shows or hides the row's own controls (not the children); called by Show and Hide, and
+  // again with true when a shown row opens or closes.
   virtual void ShowControls(bool /*show*/) {}
   // Where the disclosure triangle sits, relative to the row's left and top.
   virtual Point GetDisclosureTrianglePosition() const;

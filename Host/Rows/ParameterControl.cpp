@@ -233,6 +233,10 @@ TickTime ParameterControl::GetEditTime() const {
   return mSequence ? mSequence->GetCurrentTime() : kTime_Zero;
 }
 
+ParamValue ParameterControl::GetValueAtEditTime() const {
+  return mParam ? mParam->GetValueAt(GetClipEditTime()) : ParamValue(0.0);
+}
+
 TickTime ParameterControl::SequenceTimeToClipTime(TickTime sequenceTime) const {
   return mTrackItem ? mTrackItem->SequenceTimeToClipTime(sequenceTime) : sequenceTime;
 }

@@ -138,6 +138,8 @@ class ParameterControl : public EffectItem, public Commander {
   // The edit line in sequence time, and the same instant in clip time.
   TickTime GetEditTime() const;
   TickTime GetClipEditTime() const { return SequenceTimeToClipTime(GetEditTime()); }
+  // The parameter's value at the edit time (its default when the row has no parameter).
+  ParamValue GetValueAtEditTime() const;
   // Through the track item; the identity without one.
   TickTime SequenceTimeToClipTime(TickTime sequenceTime) const;
   TickTime ClipTimeToSequenceTime(TickTime clipTime) const;
