@@ -123,7 +123,6 @@ class FilterItem : public EffectItem, public Commander {
   void Reset();
   void RunSetup();
   void ChoosePreset(int index);
-  void ShowPresetMenu();
   void BroadcastToMonitor() const;
 
   MediaType mMediaType;
