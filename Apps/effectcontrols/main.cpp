@@ -85,7 +85,8 @@ int Run(const ProgramOptions& options) {
   const bool windowed = !options.headless && HasDisplay();
   if (windowed) {
     std::string error;
-    const auto window = SdlWindow::Open(application.GetViewHost(), "Effect Controls", &error);
+    const std::string title = "Effect Controls - " + application.GetProject()->GetName();
+    const auto window = SdlWindow::Open(application.GetViewHost(), title, &error);
     if (window == nullptr)
       return Fail(kExitCannotStart, "cannot open a window (" + error + "); use --headless");
     if (!script) {

@@ -9,6 +9,7 @@
 #include <utility>
 
 #include "Host/Messaging/MessageLoop.h"
+#include "Host/Model/Project.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Application.h"
@@ -67,6 +68,10 @@ ScriptRunner::ScriptRunner(Application& application, ScriptInputRoute& input, st
 ScriptRunner::~ScriptRunner() {
   SetMenuTracker(std::move(mPreviousMenus));
   InputBox::SetResponder(std::move(mPreviousInputBoxes));
+}
+
+void ScriptRunner::SetProjectSaver(ProjectSaver saver) {
+  mProjectSaver = std::move(saver);
 }
 
 void ScriptRunner::SetShotSource(std::function<Image()> source) {
@@ -154,8 +159,7 @@ std::string ScriptRunner::Execute(const ScriptCommand& command, ScriptRunResult&
     case ScriptVerb::kDump:
       return RunDump(command, result);
     case ScriptVerb::kSave:
-      return "saving is not available yet: this build cannot write project files ('" +
-             command.text + "' was not written)";
+      return RunSave(command, result);
   }
   return "unknown verb";
 }
@@ -362,6 +366,26 @@ std::string ScriptRunner::RunDump(const ScriptCommand& command, ScriptRunResult&
   const std::string path = ResolvePath(command.text);
   if (auto error = WriteFile(path, StateDumpWriter::Write(mApplication)); !error.empty())
     return error;
+  result.written.push_back(path);
+  return {};
+}
+
+std::string ScriptRunner::RunSave(const ScriptCommand& command, ScriptRunResult& result) {
+  if (!mProjectSaver) {
+    return "saving is not available yet: this build cannot write project files ('" + command.text +
+           "' was not written)";
+  }
+  const ProjectRef& project = mApplication.GetProject();
+  if (project == nullptr)
+    return "no project is open";
+  const std::string path = ResolvePath(command.text);
+  std::error_code ec;
+  const auto parent = std::filesystem::path(path).parent_path();
+  if (!parent.empty())
+    std::filesystem::create_directories(parent, ec);
+  std::string error;
+  if (!mProjectSaver(*project, path, &error))
+    return "cannot save '" + path + "': " + (error.empty() ? "unknown error" : error);
   result.written.push_back(path);
   return {};
 }

@@ -12,6 +12,7 @@
 #include "Host/Toolkit/Geometry.h"
 
 class Application;
+class Project;
 class Image;
 class InputBoxResponder;
 class MenuTracker;
@@ -56,6 +57,12 @@ class ScriptRunner {
   // read-back). An empty image counts as a failure.
   void SetShotSource(std::function<Image()> source);
 
+  // Writes the project for `save` (path resolved like every other file): true, or false with
+  // `error` set. Without one, `save` fails with "saving is not available yet".
+  using ProjectSaver =
+      std::function<bool(const Project& project, const std::string& path, std::string* error)>;
+  void SetProjectSaver(ProjectSaver saver);
+
   // Files and folders named in a script, resolved against the output folder.
   std::string ResolvePath(const std::string& name) const;
 
@@ -71,6 +78,7 @@ class ScriptRunner {
   std::string RunUndoRedo(bool undo);
   std::string RunShot(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunDump(const ScriptCommand& command, ScriptRunResult& result);
+  std::string RunSave(const ScriptCommand& command, ScriptRunResult& result);
   std::string WriteFile(const std::string& path, const std::string& content);
   // The command named by an id or a "cmd...." name, or an error.
   std::optional<CommandID> LookUpCommand(const std::string& text, std::string& error) const;
@@ -84,6 +92,7 @@ class ScriptRunner {
   ScriptInputRoute& mInput;   // not owned
   std::string mOutDir;
   std::function<Image()> mShotSource;
+  ProjectSaver mProjectSaver;
   std::shared_ptr<ScriptedMenuTracker> mMenus;
   std::shared_ptr<ScriptedInputBox> mInputBoxes;
   std::shared_ptr<MenuTracker> mPreviousMenus;

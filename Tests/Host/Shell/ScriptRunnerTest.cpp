@@ -416,6 +416,27 @@ TEST_F(ScriptRunnerTest, SaveIsRefusedAndNothingIsWritten) {
   EXPECT_FALSE(std::filesystem::exists(mOut / "copy.json"));
 }
 
+TEST_F(ScriptRunnerTest, SaveWritesThroughTheProjectSaverOnlyWhenAsked) {
+  std::vector<std::string> saved;
+  mRunner->SetProjectSaver([&saved](const Project& project, const std::string& path, std::string*) {
+    saved.push_back(project.GetName() + " -> " + path);
+    return true;
+  });
+  auto result = RunText("command cmd.test.toggle\nsave copies/demo.json\n");
+  ASSERT_TRUE(result.ok) << result.Describe();
+  const std::string path = (mOut / "copies" / "demo.json").string();
+  EXPECT_EQ(saved, std::vector<std::string>{"Demo -> " + path});
+  EXPECT_EQ(result.written, std::vector<std::string>{path});
+
+  mRunner->SetProjectSaver([](const Project&, const std::string&, std::string* error) {
+    *error = "disk full";
+    return false;
+  });
+  result = RunText("save demo.json\n");
+  EXPECT_EQ(result.Describe(),
+            "line 1: cannot save '" + (mOut / "demo.json").string() + "': disk full");
+}
+
 TEST_F(ScriptRunnerTest, AnExceptionFromTheViewStopsTheRunAtItsLine) {
   // The null-interface exception is caught at command dispatch; a view must not see others,
   // but if one escapes the runner reports it instead of crashing.
