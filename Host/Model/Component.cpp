@@ -189,6 +189,18 @@ Project* Component::GetProject() const {
   return chain ? chain->GetProject() : nullptr;
 }
 
+void Component::FollowParamChange(const ComponentParam& param) {
+  if (param.GetDisablesWhenOn().empty()) {
+    return;
+  }
+  const auto* on = std::get_if<bool>(&param.GetConstantValue());
+  for (const std::string& name : param.GetDisablesWhenOn()) {
+    if (ComponentParamRef dependent = FindParam(name); dependent && dependent.get() != &param) {
+      dependent->SetEnabled(!(on && *on));
+    }
+  }
+}
+
 void Component::NotifyChanged() {
   Broadcast(ComponentChangedMessage(ComponentRef(this)));
 }

@@ -128,6 +128,8 @@ class Component : public ModelObject {
   // Sends ComponentChangedMessage (setters call it; parameters that change their enabled or
   // visible state do too).
   void NotifyChanged();
+  // Parameters call it after a change: keeps the parameters that depend on it up to date.
+  void FollowParamChange(const ComponentParam& param);
 
  private:
   Component(std::string matchName, std::string effectName, MediaType mediaType, bool intrinsic);

@@ -56,6 +56,7 @@ ComponentParamRef ComponentParam::Clone() const {
   copy->mUnits = mUnits;
   copy->mStep = mStep;
   copy->mMenuEntries = mMenuEntries;
+  copy->mDisablesWhenOn = mDisablesWhenOn;
   copy->mCanVary = mCanVary;
   copy->mVisible = mVisible;
   copy->mEnabled = mEnabled;
@@ -142,6 +143,11 @@ ComponentParamRef ComponentParam::SetGroupKind(GroupKind kind) {
 
 ComponentParamRef ComponentParam::SetMenuEntries(std::vector<std::string> entries) {
   mMenuEntries = std::move(entries);
+  return ComponentParamRef(this);
+}
+
+ComponentParamRef ComponentParam::SetDisablesWhenOn(std::vector<std::string> names) {
+  mDisablesWhenOn = std::move(names);
   return ComponentParamRef(this);
 }
 
@@ -303,6 +309,7 @@ void ComponentParam::NotifyChanged() {
   BroadcastMessage(GetStation(),
                    ParamChangedMessage(ComponentRef(mComponent), ComponentParamRef(this)));
   if (mComponent) {
+    mComponent->FollowParamChange(*this);
     if (ComponentChain* chain = mComponent->GetChain()) {
       chain->NotifyValuesChanged();
     }

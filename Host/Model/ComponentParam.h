@@ -76,6 +76,10 @@ class ComponentParam : public ModelObject {
   ComponentParamRef SetGroupKind(GroupKind kind);
   ComponentParamRef SetMenuEntries(std::vector<std::string> entries);
   ComponentParamRef SetCanVaryOverTime(bool can);
+  // A check box that, while on, disables the named parameters of its component (and enables
+  // them while off); kept up on every change, undo and redo included.
+  ComponentParamRef SetDisablesWhenOn(std::vector<std::string> names);
+  const std::vector<std::string>& GetDisablesWhenOn() const { return mDisablesWhenOn; }
 
   // Presentation state; changing it sends ParamChangedMessage (not undoable: it follows other
   // values, e.g. a check box that disables a slider).
@@ -139,6 +143,7 @@ class ComponentParam : public ModelObject {
   ParamUnits mUnits = ParamUnits::None;
   double mStep = 1.0;
   std::vector<std::string> mMenuEntries;
+  std::vector<std::string> mDisablesWhenOn;
   bool mCanVary = true;
   bool mVisible = true;
   bool mEnabled = true;

@@ -66,7 +66,7 @@ ComponentRef Motion() {
                                      ->SetSliderRange(0.0, 100.0);
   scaleWidth->SetEnabled(false);  // follows Uniform Scale
   effect->AddParam(scaleWidth);
-  effect->AddParam(Check("Uniform Scale", true, false));
+  effect->AddParam(Check("Uniform Scale", true, false)->SetDisablesWhenOn({"Scale Width"}));
   effect->AddParam(Scalar("Rotation", 0.0, -1.0e6, 1.0e6, 1, ParamUnits::Degrees, ParamType::Angle)
                        ->SetSliderRange(-180.0, 180.0));
   effect->AddParam(Point("Anchor Point", 960.0, 540.0));

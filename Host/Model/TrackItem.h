@@ -62,6 +62,8 @@ class TrackItem : public ModelObject {
   const MasterClipRef& GetMasterClip() const { return mMasterClip; }
   // The item's own name, else its master clip's, else the transition's display name.
   std::string GetName() const;
+  // The name given to the item itself; empty when it shows its master clip's.
+  const std::string& GetOwnName() const { return mName; }
   void SetName(std::string name);
 
   // Frame rate the item's times snap to: its sequence's video or audio rate, else its media's.
