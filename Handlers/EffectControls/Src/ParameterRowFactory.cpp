@@ -1,0 +1,241 @@
+#include "Handlers/EffectControls/Src/ParameterRowFactory.h"
+
+#include <cxxabi.h>
+
+#include <cstdlib>
+#include <typeinfo>
+#include <utility>
+
+#include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Host/Messaging/Diagnostics.h"
+#include "Host/Model/Component.h"
+#include "Host/Model/ComponentParam.h"
+#include "Host/Model/ModelTypes.h"
+#include "Host/Model/TrackItem.h"
+#include "Host/Rows/CheckboxParameter.h"
+#include "Host/Rows/EffectItem.h"
+#include "Host/Rows/GroupBeginParameter.h"
+#include "Host/Rows/InfoParameter.h"
+#include "Host/Rows/SpreadsheetParameter.h"
+#include "Host/Rows/TextParameter.h"
+
+namespace {
+
+// A row that stands in for a class the panel does not have yet, and says which.
+class StandInRowName {
+ public:
+  explicit StandInRowName(std::string className) : mClassName(std::move(className)) {}
+  virtual ~StandInRowName() = default;
+  const std::string& GetStandInClassName() const { return mClassName; }
+
+ private:
+  std::string mClassName;
+};
+
+template <class HostRow>
+class StandInRow final : public HostRow, public StandInRowName {
+ public:
+  template <class... Args>
+  StandInRow(std::string_view meant, std::string_view made, Args&&... args)
+      : HostRow(std::forward<Args>(args)...),
+        StandInRowName(std::string(meant) + " (host " + std::string(made) + ")") {}
+};
+
+// The host row that shows a parameter's value as text: what every value parameter falls back to
+// until its own row exists.
+std::shared_ptr<ParameterControl> ValueStandIn(std::string_view meant,
+                                               const ParameterControlInfo& info) {
+  return std::make_shared<StandInRow<InfoParameter>>(meant, "InfoParameter", info);
+}
+
+std::shared_ptr<GroupBeginParameter> GroupStandIn(std::string_view meant,
+                                                  const ParameterControlInfo& info) {
+  return std::make_shared<StandInRow<GroupBeginParameter>>(meant, "GroupBeginParameter", info);
+}
+
+std::shared_ptr<EffectItem> ItemStandIn(std::string_view meant, ViewBase* parentView,
+                                        std::string name, const StationName& station) {
+  return std::make_shared<StandInRow<EffectItem>>(meant, "EffectItem", parentView, std::move(name),
+                                                  station);
+}
+
+bool IsChromil(const ComponentRef& component) {
+  return component && component->GetMatchName() == kMatchnameChromil;
+}
+
+std::string Demangle(const char* mangled) {
+  int status = 0;
+  char* readable = abi::__cxa_demangle(mangled, nullptr, nullptr, &status);
+  if (status != 0 || readable == nullptr) {
+    return mangled;
+  }
+  std::string result(readable);
+  std::free(readable);  // NOLINT: allocated by the demangler with malloc
+  return result;
+}
+
+}  // namespace
+
+std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParameterRows(
+    const ParameterRowRequest& request) {
+  const ParameterControlInfo& info = request.info;
+  if (!HOST_VERIFY(info.param, "Invalid ComponentParam")) {
+    return {};
+  }
+  const bool ownSliderRows = (request.listStyle & kOwnSliderRowsStyle) != 0;
+  const bool video = info.component && info.component->GetMediaType() == MediaType::Video;
+
+  std::vector<std::shared_ptr<ParameterControl>> rows;
+  switch (info.param->GetType()) {
+    case ParamType::Slider:
+      rows.push_back(ValueStandIn("SliderParameter", info));
+      break;
+    case ParamType::FloatSlider:
+      rows.push_back(
+          ValueStandIn(video ? "VideoFloatSliderParameter" : "AudioFloatSliderParameter", info));
+      break;
+    case ParamType::Angle:
+      rows.push_back(ValueStandIn(ownSliderRows ? "AngleSliderParameter" : "AngleParameter", info));
+      break;
+    case ParamType::Checkbox:
+      rows.push_back(std::make_shared<CheckboxParameter>(info));
+      break;
+    case ParamType::Color:
+      rows.push_back(ValueStandIn(
+          IsChromil(info.component) ? "OffscreenPickerParameter" : "ColorPickerParameter", info));
+      break;
+    case ParamType::Point:
+      if (ownSliderRows) {
+        // One row per coordinate: horizontal, then vertical.
+        rows.push_back(ValueStandIn("PointSliderParameter", info));
+        rows.push_back(ValueStandIn("PointSliderParameter", info));
+      } else if (info.component && info.component->IsCapsule()) {
+        rows.push_back(ValueStandIn("LinkedPointPickerParameter", info));
+      } else {
+        rows.push_back(ValueStandIn("PointPickerParameter", info));
+      }
+      break;
+    case ParamType::Menu:
+      rows.push_back(ValueStandIn("MenuParameter", info));
+      break;
+    case ParamType::DoubleSlider:
+    case ParamType::TimeRemapping:
+      rows.push_back(ValueStandIn("DoubleSliderParameter", info));
+      break;
+    case ParamType::Custom:
+      rows.push_back(ValueStandIn(info.component && info.component->IsGraphicsComponent()
+                                      ? "GraphicsParameter"
+                                      : "CustomParameter",
+                                  info));
+      break;
+    case ParamType::TrackMenu:
+      rows.push_back(ValueStandIn("TrackMenuParameter", info));
+      break;
+    case ParamType::Timecode:
+      rows.push_back(ValueStandIn("TimecodeParameter", info));
+      break;
+    case ParamType::Button:
+      rows.push_back(ValueStandIn("ButtonParameter", info));
+      break;
+    case ParamType::Opaque:
+      rows.push_back(ValueStandIn("OpaqueParameter", info));
+      break;
+    case ParamType::Text:
+      rows.push_back(std::make_shared<TextParameter>(info, request.textEditable));
+      break;
+    case ParamType::Info:
+      rows.push_back(std::make_shared<InfoParameter>(info));
+      break;
+    case ParamType::Spreadsheet:
+      rows.push_back(std::make_shared<SpreadsheetParameter>(info));
+      break;
+    case ParamType::GroupBegin:
+    case ParamType::GroupEnd:
+    case ParamType::AudioGain:
+      break;  // groups have rows of their own; the others have no row
+  }
+  return rows;
+}
+
+std::shared_ptr<GroupBeginParameter> ParameterRowFactory::CreateGroupRow(
+    const ParameterRowRequest& request) {
+  const ParameterControlInfo& info = request.info;
+  if (!HOST_VERIFY(info.param, "Invalid ComponentParam")) {
+    return nullptr;
+  }
+  switch (info.param->GetGroupKind()) {
+    case GroupKind::HueBalanceAndPhase:
+      return GroupStandIn("GroupHueBalanceAndPhaseBeginParameter", info);
+    case GroupKind::ThreeWayHueBalance:
+      return GroupStandIn("GroupThreeWayHueBalanceBeginParameter", info);
+    case GroupKind::TonalRangeDefinition:
+      return GroupStandIn("GroupTonalRangeDefinitionBeginParameter", info);
+    case GroupKind::Levels:
+      return GroupStandIn("GroupLevelsBeginParameter", info);
+    case GroupKind::RGBCurves:
+      return GroupStandIn("GroupRGBCurvesBeginParameter", info);
+    case GroupKind::Buttons:
+      return GroupStandIn(request.componentIsMask ? "GroupTrackerButtonsBeginParameter"
+                                                  : "GroupButtonsBeginParameter",
+                          info);
+    case GroupKind::Curve:
+      return GroupStandIn("GroupCurveBeginParameter", info);
+    case GroupKind::ColorPickerRange:
+      return GroupStandIn("GroupColorPickerRangeBeginParameter", info);
+    case GroupKind::HueRangeDefinition:
+      return GroupStandIn("GroupHueRangeDefinitionBeginParameter", info);
+    case GroupKind::SaturationRangeDefinition:
+      return GroupStandIn("GroupSaturationRangeDefinitionBeginParameter", info);
+    case GroupKind::LumaRangeDefinition:
+      return GroupStandIn("GroupLumaRangeDefinitionBeginParameter", info);
+    case GroupKind::SecondaryColorCorrection:
+      return GroupStandIn("GroupSecondaryColorCorrectionBeginParameter", info);
+    case GroupKind::None:
+    case GroupKind::Counted:
+      break;
+  }
+  return std::make_shared<GroupBeginParameter>(info);
+}
+
+std::shared_ptr<EffectItem> ParameterRowFactory::CreateMaskShapeRow(ViewBase* parentView,
+                                                                    const StationName& station,
+                                                                    const ComponentRef& component) {
+  HOST_ASSERT(component, "Invalid Component");
+  return ItemStandIn("MaskShapeControl", parentView, std::string(), station);
+}
+
+std::shared_ptr<EffectItem> ParameterRowFactory::CreateCustomAudioFilterRow(
+    ViewBase* parentView, const StationName& station, const ComponentRef& component,
+    bool /*second*/) {
+  // Both custom rows look alike until the custom interface exists.
+  if (!HOST_VERIFY(component, "Invalid Component")) {
+    return nullptr;
+  }
+  return ItemStandIn("CustomAudioFilterItem", parentView, std::string(), station);
+}
+
+std::shared_ptr<EffectItem> ParameterRowFactory::CreateVideoTransitionRow(
+    ViewBase* parentView, const StationName& station, const TrackItemRef& transition) {
+  if (!HOST_VERIFY(transition, "Invalid TrackItem")) {
+    return nullptr;
+  }
+  return ItemStandIn("VideoTransitionItem", parentView, transition->GetName(), station);
+}
+
+std::shared_ptr<EffectItem> ParameterRowFactory::CreateAudioTransitionRow(
+    ViewBase* parentView, const StationName& station, const TrackItemRef& transition) {
+  if (!HOST_VERIFY(transition, "Invalid TrackItem")) {
+    return nullptr;
+  }
+  return ItemStandIn("AudioTransitionItem", parentView, transition->GetName(), station);
+}
+
+std::string ParameterRowFactory::GetRowClassName(const EffectItem& row) {
+  if (const auto* standIn = dynamic_cast<const StandInRowName*>(&row)) {
+    return standIn->GetStandInClassName();
+  }
+  if (dynamic_cast<const FilterItem*>(&row) != nullptr) {
+    return "FilterItem";
+  }
+  return Demangle(typeid(row).name());
+}
