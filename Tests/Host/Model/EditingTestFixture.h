@@ -52,9 +52,10 @@ inline constexpr TickTime kSec = kTicksPerSecond;
 inline constexpr TickTime kFrame25 = kTicksPerSecond / 25;
 
 // A project with one 25 fps sequence. V1: clip A [0 s, 5 s) showing media from 2 s of a 20 s
-// file, clip B [5 s, 10 s) from 0 s of a 30 s file, a dissolve over the cut [4.5 s, 5.5 s);
-// then clip C [12 s, 14 s). A1: A's and B's linked audio at the same times, C's audio. Every clip
-// carries its intrinsics; clip A's video also Gaussian Blur and Crop.
+// file (media in the sequence from -2 s to 18 s), clip B [5 s, 10 s) from 3 s of a 30 s file
+// (media from 2 s to 32 s), a dissolve over the cut [4.5 s, 5.5 s);
+// then clip C [12 s, 14 s) from 10 s of B's file. A1: A's and B's linked audio at the same times,
+// C's audio. Every clip carries its intrinsics; clip A's video also Gaussian Blur and Crop.
 class EditingModelTest : public ::testing::Test {
  protected:
   EditingModelTest() {
@@ -74,10 +75,10 @@ class EditingModelTest : public ::testing::Test {
     project->AddMasterClip(clipB);
 
     a = AddClip(v1, clipA, 0, 5 * kSec, 2 * kSec, 1);
-    b = AddClip(v1, clipB, 5 * kSec, 10 * kSec, 0, 2);
+    b = AddClip(v1, clipB, 5 * kSec, 10 * kSec, 3 * kSec, 2);
     c = AddClip(v1, clipB, 12 * kSec, 14 * kSec, 10 * kSec, 3);
     aAudio = AddClip(a1, clipA, 0, 5 * kSec, 2 * kSec, 1);
-    bAudio = AddClip(a1, clipB, 5 * kSec, 10 * kSec, 0, 2);
+    bAudio = AddClip(a1, clipB, 5 * kSec, 10 * kSec, 3 * kSec, 2);
     cAudio = AddClip(a1, clipB, 12 * kSec, 14 * kSec, 10 * kSec, 3);
 
     TransitionData dissolve;
@@ -107,6 +108,14 @@ class EditingModelTest : public ::testing::Test {
   }
 
   std::string State() const { return DescribeForTest(*project); }
+
+  // Listens to the sequence and every item of the fixture.
+  void ListenToEverything(EditingMessageLog& log) const {
+    log.Listen(sequence->GetStation());
+    for (const TrackItemRef& item : {a, b, c, aAudio, bAudio, cAudio, transition}) {
+      log.Listen(item->GetStation());
+    }
+  }
 
   // "[start,end)" of an item in whole frames of 25 fps, for short expectations.
   static std::string Span(const TrackItemRef& item) {

@@ -334,13 +334,13 @@ TEST_F(KeyframeSelectionTest, PasteOntoAnotherClipFindsTheSameEffectParameter) {
   ComponentRef blurOnB = EffectCatalogue::Standard().Create(kMatchName_GaussianBlur);
   b->GetComponentChain()->Append(blurOnB);
   ASSERT_TRUE(KeyframeMultiSelectionEditor::PasteValid(sequence, b->GetComponentChain()));
-  sequence->SetCurrentTime(6 * kSec);  // clip B's clip time 1 s
+  sequence->SetCurrentTime(6 * kSec);  // clip B's clip time 4 s
   ASSERT_EQ(KeyframeMultiSelectionEditor::Paste(sequence, b->GetComponentChain()),
             EditStatus::Done);
   const ComponentParamRef target = blurOnB->FindParam("Blurriness");
   EXPECT_TRUE(target->IsTimeVarying());
-  EXPECT_EQ(target->GetKeyframeTimes(), std::vector<TickTime>{kSec});
-  EXPECT_EQ(target->GetValueAt(kSec), ParamValue(10.0));
+  EXPECT_EQ(target->GetKeyframeTimes(), std::vector<TickTime>{4 * kSec});
+  EXPECT_EQ(target->GetValueAt(4 * kSec), ParamValue(10.0));
 }
 
 TEST_F(KeyframeSelectionTest, PasteReplacesAKeyframeAtTheSameTime) {
