@@ -4,6 +4,7 @@
 
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/ComponentParamActions.h"
+#include "Host/Model/KeyframeHandleActor.h"
 #include "Host/Model/KeyframeMultiSelection.h"
 #include "Host/Model/KeyframeMultiSelectionActor.h"
 #include "Host/Model/KeyframeMultiSelectionEditor.h"
@@ -375,6 +376,46 @@ TEST_F(KeyframeSelectionTest, CopyWithNothingSelectedLeavesTheClipboard) {
   EXPECT_TRUE(project->GetClipboard().IsEmpty());
   EXPECT_EQ(KeyframeMultiSelectionEditor::Paste(sequence, a->GetComponentChain()),
             EditStatus::NoChange);
+}
+
+// --- Handles ---
+
+TEST_F(KeyframeSelectionTest, DraggingAValueHandleUpSteepensTheOutgoingSide) {
+  // Keys 10 at 3 s and 20 at 4 s: a straight 10 per second.
+  const std::string before = State();
+  {
+    KeyframeHandleActor actor(blurriness, 3 * kSec, KeyframeSide::Out,
+                              KeyframeHandleActor::Graph::Value);
+    ASSERT_TRUE(actor.IsValid());
+    // The handle sits a third of the way (1/3 s, value 13.33); lift it by 2.
+    ASSERT_TRUE(actor.MoveTo(0, 2.0));
+    const Keyframe& key = blurriness->GetKeyframes().At(1);
+    EXPECT_EQ(key.interpolation, TemporalInterpolation::Bezier);
+    EXPECT_NEAR(key.outSpeed, 16.0, 1e-6);
+    EXPECT_NEAR(key.outInfluence, kDefaultInfluence, 1e-9);
+    // Dragged past the segment's middle, the handle stops there.
+    ASSERT_TRUE(actor.MoveTo(5 * kSec, 0.0));
+    EXPECT_NEAR(blurriness->GetKeyframes().At(1).outInfluence, kMaximumInfluence, 1e-9);
+    EXPECT_EQ(actor.Commit(), EditStatus::Done);
+  }
+  EXPECT_EQ(project->GetUndoStack().GetUndoName(), kKeyframeActionMoveHandle);
+  ASSERT_TRUE(project->GetUndoStack().Undo());
+  EXPECT_EQ(State(), before);
+}
+
+TEST_F(KeyframeSelectionTest, VelocityHandleAddsToTheSpeedAndTheLastKeyHasNoOutgoingHandle) {
+  KeyframeHandleActor last(blurriness, 6 * kSec, KeyframeSide::Out,
+                           KeyframeHandleActor::Graph::Velocity);
+  EXPECT_FALSE(last.IsValid());
+  EXPECT_FALSE(last.MoveTo(0, 1.0));
+  const std::string before = State();
+  {
+    KeyframeHandleActor actor(blurriness, 4 * kSec, KeyframeSide::In,
+                              KeyframeHandleActor::Graph::Velocity);
+    ASSERT_TRUE(actor.MoveTo(0, -4.0));
+    EXPECT_NEAR(blurriness->GetKeyframes().At(2).inSpeed, 6.0, 1e-9);
+  }
+  EXPECT_EQ(State(), before);  // dropped without a commit
 }
 
 }  // namespace
