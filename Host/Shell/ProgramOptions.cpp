@@ -87,8 +87,14 @@ std::string ProgramOptions::Usage() {
   return "usage: effectcontrols [--project FILE] [--size WxH] [--script FILE] [--out DIR] "
          "[--headless]\n"
          "  --project FILE  project to open (default: the built-in demo project)\n"
-         "  --size WxH      panel size in pixels (default 960x540)\n"
+         "  --size WxH      workspace (window) size in pixels (default 960x540)\n"
          "  --script FILE   automation script to run; shots and dumps go under --out\n"
          "  --out DIR       folder for shots, dumps and saves (default: the current folder)\n"
-         "  --headless      never open a window, even with a display\n";
+         "  --headless      never open a window, even with a display\n"
+         "Script lines (one a line, '#' comments; coordinates are panel pixels):\n"
+         "  select ID... | select-none | time TICKS|hh:mm:ss:ff\n"
+         "  click|rclick|dblclick X Y [shift] [ctrl] [alt] | drag X1 Y1 X2 Y2 [steps N] [mods]\n"
+         "  move X Y | wheel DY | key NAME [mods] | type TEXT\n"
+         "  command ID-or-NAME | menu-answer ID-or-NAME|none | input-answer TEXT\n"
+         "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE\n";
 }
