@@ -35,6 +35,12 @@ class CountingTabView : public TabView {
  public:
   int openCount = 0;
   int viewCommands = 0;
+  int layouts = 0;  // after the tab was created
+
+  void SetBoundsSelf(const Rect& /*bounds*/) override {
+    if (IsTabCreated())
+      ++layouts;
+  }
 
   bool FindCommandStatus(CommandID command, CommandStatus& status) override {
     if (command != kViewCommand)
@@ -319,6 +325,21 @@ TEST_F(ApplicationTest, NextAndPreviousPanelCommandsCycleTheTabs) {
   EXPECT_TRUE(app.DoCommand(kCommandSelectPreviousPanel));
   EXPECT_EQ(frame.GetFrontTab(), b);
   EXPECT_FALSE(app.DoCommand(kCommandSelectFindBox)) << "no find box in this host";
+}
+
+TEST_F(ApplicationTest, MaximisingTheFrameLetsTheTabsLayOutAgain) {
+  RegisterHandler("Test.H1");
+  Application app;
+  app.CreateHandlers();
+  TabView* tab = app.OpenTab("Test.H1");
+  EXPECT_FALSE(tab->IsFrameMaximized());
+  HandlerOf(app, "Test.H1").GetView()->layouts = 0;
+  app.SetWorkspaceMaximized(true);
+  EXPECT_TRUE(tab->IsFrameMaximized());
+  EXPECT_EQ(HandlerOf(app, "Test.H1").GetView()->layouts, 1)
+      << "same size, new layout: the panel keeps a separate split for a maximised frame";
+  app.SetWorkspaceMaximized(true);
+  EXPECT_EQ(HandlerOf(app, "Test.H1").GetView()->layouts, 1) << "no change, no layout";
 }
 
 TEST_F(ApplicationTest, ClickingATabNameBringsItToTheFront) {
