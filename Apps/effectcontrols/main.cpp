@@ -11,6 +11,7 @@
 #include <variant>
 #include <vector>
 
+#include "Apps/effectcontrols/EmbeddedDemoProject.h"
 #include "Host/Messaging/MessageLoop.h"
 #include "Host/Model/Project.h"
 #include "Host/Shell/Application.h"
@@ -26,6 +27,11 @@
 #include "Host/Toolkit/InputBox.h"
 #include "Host/Toolkit/MenuTracker.h"
 #include "Host/Toolkit/ViewHost.h"
+
+// Project files: the model's reader and writer, once the build has them (CMakeLists.txt).
+#ifdef EC_HAVE_PROJECT_FILE
+#include "Host/Model/ProjectFile.h"
+#endif
 
 namespace {
 
@@ -46,6 +52,42 @@ int Fail(int code, const std::string& message) {
 void Settle(Application& application) {
   MessageLoop::Instance().RunPending();
   application.GetViewHost().Render();
+}
+
+// The built-in demo: examples/demo.json as embedded at build time, or, without a project file
+// reader or without that file, the same project made in code.
+ProjectRef OpenDemoProject([[maybe_unused]] std::string& error) {
+#ifdef EC_HAVE_PROJECT_FILE
+  if (!EmbeddedDemoProjectJSON().empty()) {
+    ProjectLoadResult loaded = ProjectFile::LoadFromString(EmbeddedDemoProjectJSON());
+    if (!loaded)
+      error = "the built-in demo project does not load: " + loaded.error;
+    return loaded.project;
+  }
+#endif
+  return BuildDemoProject();
+}
+
+ProjectRef OpenProjectFile(const std::string& path, std::string& error) {
+#ifdef EC_HAVE_PROJECT_FILE
+  ProjectLoadResult loaded = ProjectFile::Load(path);
+  if (!loaded)
+    error = loaded.error.starts_with(path) ? loaded.error : path + ": " + loaded.error;
+  return loaded.project;
+#else
+  error = "cannot open '" + path +
+          "': opening project files is not available yet (run without --project for the demo "
+          "project)";
+  return nullptr;
+#endif
+}
+
+void AllowSaving([[maybe_unused]] ScriptRunner& runner) {
+#ifdef EC_HAVE_PROJECT_FILE
+  runner.SetProjectSaver([](const Project& project, const std::string& path, std::string* error) {
+    return ProjectFile::Save(project, path, error);
+  });
+#endif
 }
 
 int ReportRun(const ScriptRunResult& result) {
@@ -69,22 +111,22 @@ int Run(const ProgramOptions& options) {
     }
     script = std::get<AutomationScript>(std::move(parsed));
   }
-  if (!options.projectPath.empty()) {
-    return Fail(kExitCannotStart, "cannot open '" + options.projectPath +
-                                      "': opening project files is not available yet "
-                                      "(run without --project for the demo project)");
-  }
+  // The project is read before anything opens; the file is never written except by `save`.
+  std::string error;
+  ProjectRef project = options.projectPath.empty() ? OpenDemoProject(error)
+                                                   : OpenProjectFile(options.projectPath, error);
+  if (project == nullptr)
+    return Fail(kExitCannotStart, error);
 
   Application application(options.size);
   application.LoadModules();
   application.CreateHandlers();
-  application.OpenProject(BuildDemoProject());
+  application.OpenProject(std::move(project));
   application.OpenAllWindows();
   Settle(application);
 
   const bool windowed = !options.headless && HasDisplay();
   if (windowed) {
-    std::string error;
     const std::string title = "Effect Controls - " + application.GetProject()->GetName();
     const auto window = SdlWindow::Open(application.GetViewHost(), title, &error);
     if (window == nullptr)
@@ -101,6 +143,7 @@ int Run(const ProgramOptions& options) {
     int exitCode = EXIT_SUCCESS;
     {
       ScriptRunner runner(application, window->GetInputRoute(), options.outDir);
+      AllowSaving(runner);
       // Shots show what the window shows.
       runner.SetShotSource([&window] { return window->ReadBack(); });
       exitCode = ReportRun(runner.Run(*script));
@@ -113,6 +156,7 @@ int Run(const ProgramOptions& options) {
 
   ViewHostInputRoute input(application.GetViewHost());
   ScriptRunner runner(application, input, options.outDir);
+  AllowSaving(runner);
   if (script)
     return ReportRun(runner.Run(*script));
   // Headless without a script: one frame of the workspace.

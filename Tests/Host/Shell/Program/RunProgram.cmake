@@ -8,6 +8,7 @@ cmake_minimum_required(VERSION 3.25)
 #   -DEXPECT_STDERR=regex     (optional) what its error output must match
 #   -DEXPECT_FILES=a;b        (optional) files it must have written under OUT
 #   -DDUMP=file -DDUMP_CHECKS=json.path=value;...   (optional) values the JSON dump must hold
+#   -DEXPECT_NO_OUTPUT=1      (optional) it must have written nothing under OUT
 #   -DSAME_AS=dir             (optional) each expected file must be byte-identical to the file of
 #                             the same name in dir
 file(REMOVE_RECURSE "${OUT}")
@@ -21,6 +22,12 @@ if(NOT exit_code STREQUAL EXPECT_EXIT)
 endif()
 if(DEFINED EXPECT_STDERR AND NOT err MATCHES "${EXPECT_STDERR}")
   message(FATAL_ERROR "stderr does not match '${EXPECT_STDERR}'")
+endif()
+if(EXPECT_NO_OUTPUT)
+  file(GLOB_RECURSE written "${OUT}/*")
+  if(written)
+    message(FATAL_ERROR "expected no output, found: ${written}")
+  endif()
 endif()
 foreach(name IN LISTS EXPECT_FILES)
   if(NOT EXISTS "${OUT}/${name}")
