@@ -80,6 +80,18 @@ ordered_json SequenceJSON(const Sequence& sequence) {
     groups.push_back(std::move(ids));
   }
   j["selection"] = std::move(groups);
+  // What a script can select: every item, video tracks first.
+  ordered_json items = ordered_json::array();
+  sequence.ForEachTrackItem([&items](const TrackItemRef& item) {
+    items.push_back({{"id", item->GetID()},
+                     {"kind", item->IsTransition() ? "transition" : "clip"},
+                     {"media", item->GetMediaType() == MediaType::Video ? "video" : "audio"},
+                     {"name", item->GetName()},
+                     {"start", item->GetStart()},
+                     {"end", item->GetEnd()},
+                     {"linkGroup", item->GetLinkGroup()}});
+  });
+  j["items"] = std::move(items);
   return j;
 }
 

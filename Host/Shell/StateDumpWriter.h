@@ -6,8 +6,9 @@ class Application;
 
 // Writes the automation dump: the application's state as JSON text. Keys:
 //   "workspace": size, maximised, front tab's handler id, the tabs' handler ids and names;
-//   "sequence": the active sequence's id, name, edit line (ticks) and selected track-item ids per
-//               group (null without one);
+//   "sequence": the active sequence's id, name, edit line (ticks), selected track-item ids per
+//               group, and its items (id, kind, media, name, start, end, link group), video
+//               tracks first (null without a sequence);
 //   "undo": {"done": [oldest first], "undone": [next redo first]} action names;
 //   "assertions": the recorded debug assertions (message, condition, file, line, function, count);
 //   "panels": one entry per tab in tab order: handler id, tab name, and for views that implement

@@ -1,0 +1,87 @@
+cmake_minimum_required(VERSION 3.25)
+
+# Runs tour.ecs.in on the project the program opens by default (the demo), whatever its ids:
+# a first headless run dumps the sequence, the first linked video clip found there goes into
+# the script, and the tour's dump must show that clip's whole link group selected.
+#   -DPROGRAM=path -DOUT=dir -DTOUR=tour.ecs.in
+#   -DWINDOW=1        run the tour in a window (the caller provides the display)
+#   -DSAME_AS=dir     the tour's files must be byte-identical to those in dir
+file(REMOVE_RECURSE "${OUT}")
+file(MAKE_DIRECTORY "${OUT}")
+
+function(run_program)
+  execute_process(COMMAND "${PROGRAM}" ${ARGN} RESULT_VARIABLE code OUTPUT_VARIABLE out
+                  ERROR_VARIABLE err)
+  message(STATUS "effectcontrols ${ARGN}: exit ${code}\n${out}${err}")
+  if(NOT code EQUAL 0)
+    message(FATAL_ERROR "effectcontrols failed (exit ${code})")
+  endif()
+endfunction()
+
+# 1. Which clip to select.
+file(WRITE "${OUT}/discover.ecs" "dump discover.json\n")
+run_program(--headless --script "${OUT}/discover.ecs" --out "${OUT}/discover")
+file(READ "${OUT}/discover/discover.json" discovered)
+string(JSON count LENGTH "${discovered}" sequence items)
+set(clip "")
+set(link 0)
+math(EXPR last "${count} - 1")
+foreach(i RANGE ${last})
+  string(JSON kind GET "${discovered}" sequence items ${i} kind)
+  string(JSON media GET "${discovered}" sequence items ${i} media)
+  string(JSON group GET "${discovered}" sequence items ${i} linkGroup)
+  if(kind STREQUAL "clip" AND media STREQUAL "video" AND NOT group EQUAL 0)
+    string(JSON clip GET "${discovered}" sequence items ${i} id)
+    set(link ${group})
+    break()
+  endif()
+endforeach()
+if(clip STREQUAL "")
+  message(FATAL_ERROR "the default project has no linked video clip to select")
+endif()
+# The group the selection must hold: the clip's link group, in dump order (video first).
+set(expected_group "")
+foreach(i RANGE ${last})
+  string(JSON group GET "${discovered}" sequence items ${i} linkGroup)
+  if(group EQUAL link)
+    string(JSON id GET "${discovered}" sequence items ${i} id)
+    list(APPEND expected_group ${id})
+  endif()
+endforeach()
+string(REPLACE ";" "," expected_group "${expected_group}")
+set(expected_selection "[[${expected_group}]]")
+
+# 2. The tour.
+file(READ "${TOUR}" tour)
+string(REPLACE "{CLIP}" "${clip}" tour "${tour}")
+file(WRITE "${OUT}/tour.ecs" "${tour}")
+set(mode --headless)
+if(WINDOW)
+  set(mode "")
+endif()
+run_program(${mode} --size 480x300 --script "${OUT}/tour.ecs" --out "${OUT}/run")
+
+# 3. What it left.
+file(READ "${OUT}/run/tour.json" dump)
+foreach(check "sequence;selection=${expected_selection}" "sequence;currentTime=609638400000"
+              "workspace;width=520" "workspace;height=340" "assertions=[]")
+  string(REGEX MATCH "^([^=]*)=(.*)$" _ "${check}")
+  set(expected "${CMAKE_MATCH_2}")
+  string(JSON actual GET "${dump}" ${CMAKE_MATCH_1})
+  string(REGEX REPLACE "[ \n]" "" actual "${actual}")
+  if(NOT actual STREQUAL expected)
+    message(FATAL_ERROR "dump: ${CMAKE_MATCH_1} is '${actual}', expected '${expected}'")
+  endif()
+endforeach()
+foreach(name tour.png tour.json)
+  if(NOT EXISTS "${OUT}/run/${name}")
+    message(FATAL_ERROR "missing ${OUT}/run/${name}")
+  endif()
+  if(DEFINED SAME_AS)
+    file(SHA256 "${OUT}/run/${name}" mine)
+    file(SHA256 "${SAME_AS}/run/${name}" theirs)
+    if(NOT mine STREQUAL theirs)
+      message(FATAL_ERROR "${OUT}/run/${name} differs from ${SAME_AS}/run/${name}")
+    endif()
+  endif()
+endforeach()
