@@ -396,6 +396,10 @@ TEST_F(ScriptRunnerTest, DumpIsJSONWithHistoryAssertionsAndPanelState) {
 
   EXPECT_EQ(dump["sequence"]["name"], "Demo Sequence");
   EXPECT_EQ(dump["sequence"]["selection"], nlohmann::json::parse("[[101, 201]]"));
+  ASSERT_EQ(dump["sequence"]["items"].size(), 5u);
+  EXPECT_EQ(dump["sequence"]["items"][0]["id"], kDemoVideoClipA);
+  EXPECT_EQ(dump["sequence"]["items"][1]["kind"], "transition");
+  EXPECT_EQ(dump["sequence"]["items"][4]["media"], "audio");
   EXPECT_EQ(dump["workspace"]["frontTab"], kHandlerID);
 
   ASSERT_EQ(dump["panels"].size(), 1u);
