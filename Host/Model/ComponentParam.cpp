@@ -273,25 +273,31 @@ bool ComponentParam::SetValueAt(TickTime clipTime, const ParamValue& value) {
   if (!accepted) {
     return false;
   }
-  State state = mState;
-  if (state.timeVarying) {
-    if (auto index = state.keyframes.FindAt(clipTime)) {
-      if (state.keyframes.SetValue(*index, *accepted) != CurveStatus::Ok) {
-        return false;
-      }
-    } else {
-      Keyframe keyframe;
-      keyframe.time = clipTime;
-      keyframe.value = *accepted;
-      keyframe.interpolation = TemporalInterpolation::Linear;
-      if (state.keyframes.Add(keyframe) != CurveStatus::Ok) {
-        return false;
-      }
+  // In place: a drag sets many values in a row, and copying the curve for each would make every
+  // step cost as much as the parameter has keyframes.
+  KeyframeCurve& keyframes = mState.keyframes;
+  if (!mState.timeVarying) {
+    if (mState.value == *accepted) {
+      return true;
+    }
+    mState.value = *accepted;
+  } else if (auto index = keyframes.FindAt(clipTime)) {
+    if (keyframes.At(*index).value == *accepted) {
+      return true;
+    }
+    if (keyframes.SetValue(*index, *accepted) != CurveStatus::Ok) {
+      return false;
     }
   } else {
-    state.value = *accepted;
+    Keyframe keyframe;
+    keyframe.time = clipTime;
+    keyframe.value = *accepted;
+    keyframe.interpolation = TemporalInterpolation::Linear;
+    if (keyframes.Add(keyframe) != CurveStatus::Ok) {
+      return false;
+    }
   }
-  ApplyState(std::move(state));
+  NotifyChanged();
   return true;
 }
 

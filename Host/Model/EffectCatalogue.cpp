@@ -240,8 +240,10 @@ EffectCatalogue MakeStandard() {
 }  // namespace
 
 const EffectCatalogue& EffectCatalogue::Standard() {
-  static const EffectCatalogue standard = MakeStandard();
-  return standard;
+  // Never destroyed: its templates would dispose their stations during exit, possibly after the
+  // station registry itself is gone.
+  static const EffectCatalogue* const standard = new EffectCatalogue(MakeStandard());
+  return *standard;
 }
 
 void EffectCatalogue::Register(ComponentRef effectTemplate) {
