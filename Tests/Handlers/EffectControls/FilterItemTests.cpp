@@ -7,6 +7,7 @@
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Handlers/EffectControls/Src/UpdateActiveProgramMonitorViewMessage.h"
+#include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessagingTestScope.h"
 #include "Host/Messaging/Station.h"
@@ -329,6 +330,29 @@ TEST_F(FilterItemTest, ResettingAnUntouchedEffectMakesNoStep) {
   EXPECT_TRUE(row->ObeyCommand(FilterItem::kResetCommand));
   EXPECT_TRUE(UndoNames().empty());
   EXPECT_EQ(Count(listHeard, EffectControlsBecomeTargetMessage::kTypeName), 0);
+}
+
+// --- Setup ---
+
+TEST_F(FilterItemTest, TheSetupButtonReportsThatTheHostCannotRunSetupDialogs) {
+  effect->SetHasSetupDialog(true);
+  row = MakeRow();
+  ASSERT_NE(row->GetSetupButton(), nullptr);
+  EXPECT_THROW(row->ObeyCommand(FilterItem::kSetupCommand), NullInterfaceException);
+  ClearRecordedDebugAssertions();
+  EXPECT_TRUE(row->GetSetupButton()->Click());  // the command dispatch records it
+  ASSERT_EQ(RecordedDebugAssertions().size(), 1u);
+  EXPECT_NE(RecordedDebugAssertions()[0].message.find("IComponentSetup"), std::string::npos);
+  EXPECT_TRUE(UndoNames().empty());
+}
+
+TEST_F(FilterItemTest, OptionSixLeavesVideoEffectsWithoutSetupButton) {
+  effect->SetHasSetupDialog(true);
+  FilterItemOptions options;
+  options.option6 = true;
+  row = MakeRow(options);
+  EXPECT_EQ(row->GetSetupButton(), nullptr);
+  EXPECT_FALSE(row->HasSetup());
 }
 
 // --- Title ---
