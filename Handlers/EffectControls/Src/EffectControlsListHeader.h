@@ -1,0 +1,94 @@
+#pragma once
+
+#include <memory>
+#include <string>
+
+#include "Host/Model/ModelRefs.h"
+#include "Host/Toolkit/Font.h"
+#include "Host/Toolkit/SubView.h"
+
+class MultiPictureButton;
+
+// The row across the top of the panel: names what the panel targets (nothing, several clips,
+// one clip with its master clip, or a transition) and carries the button that shows or hides
+// the keyframe area (command kToggleKeyframesCommand, sent up the commander chain).
+//
+// Owned by the panel view (std::shared_ptr, a child view). UI thread only.
+class EffectControlsListHeader : public SubView {
+ public:
+  enum DisplayMode : int { kModeNone = 0, kModeClip = 1, kModeTransition = 2 };
+  // Hit zones of the name row in clip mode.
+  enum Zone : int { kZoneNone = 0, kZoneMaster = 1, kZoneSequence = 2, kZoneUses = 3 };
+
+  static constexpr int kToggleKeyframesCommand = 18015;
+  static constexpr int kExpanderSize = 16;
+  static constexpr int kExpanderRightInset = 20;  // expander x = width - this
+  static constexpr int kExpanderTop = 16;
+  static constexpr int kUsesZoneWidth = 21;
+
+  // `superCommander`: where the expander's command goes (the panel view; null: the parent).
+  explicit EffectControlsListHeader(Commander* superCommander = nullptr);
+  ~EffectControlsListHeader() override;
+
+  // Nothing targeted; `clipCount` > 1 shows the several-clips text.
+  void SetNoTarget(int clipCount);
+  // One clip of `sequence`; the master clip is the clip's (or its merged clip's).
+  void SetClip(const SequenceRef& sequence, const TrackItemRef& trackItem);
+  // A transition of `sequence` joining `outgoing` and `incoming` (either may be null). A null
+  // or non-transition item is refused with a debug assertion; the header stays as it was.
+  void SetTransition(const SequenceRef& sequence, const TrackItemRef& transition,
+                     const TrackItemRef& outgoing, const TrackItemRef& incoming);
+
+  void SetKeyframesVisible(bool visible);
+  bool AreKeyframesVisible() const { return mKeyframesVisible; }
+  void EnableExpander(bool enable);
+
+  int GetDisplayMode() const { return mDisplayMode; }
+  bool HasSeveralClips() const { return mSeveralClips; }
+  bool IsShowingMasterClip() const { return mShowingMasterClip; }
+  // The text the header shows, as one line (the two groups joined by two spaces in clip mode).
+  std::string GetDisplayText() const;
+  // The master group ("Master * name") and the sequence group ("sequence * clip").
+  std::string GetMasterGroupText() const;
+  std::string GetSequenceGroupText() const;
+  MultiPictureButton* GetExpander() const { return mExpander.get(); }
+
+  // The zone under `point` (local coordinates); kZoneNone outside clip mode.
+  Zone HitTestZone(Point point) const;
+  std::string GetToolTipText(Point point) const;
+
+  void FinishCreateSelf() override;
+  void SetBoundsSelf(const Rect& bounds) override;
+  void PaintSelf(DC& dc) override;
+  void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
+
+ private:
+  Rect GetTextRect() const;
+  Rect GetMasterZoneRect() const;
+  Rect GetSequenceZoneRect() const;
+  Rect GetUsesZoneRect() const;
+  void PlaceExpander();
+  void MatchFrame();
+  void GoBackToSequence();
+  void PopUpUses();
+
+  bool mKeyframesVisible = true;
+  bool mSeveralClips = false;
+  SequenceRef mSequence;
+  TrackItemRef mTrackItem;
+  TrackItemRef mOutgoing;
+  TrackItemRef mIncoming;
+  std::shared_ptr<MultiPictureButton> mExpander;
+  int mDisplayMode = kModeNone;
+  bool mShowingMasterClip = false;
+  bool mBusy = false;
+  std::string mNoTargetText;
+  std::string mSeveralClipsText;
+  std::string mMasterPrefix;
+  std::string mDelimiter;
+  std::string mTransitionText;
+  std::string mMasterClipName;
+  std::string mClipName;
+  std::string mSequenceName;
+  Font mFont;
+};
