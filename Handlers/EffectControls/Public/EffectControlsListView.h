@@ -29,6 +29,7 @@ class EffectItem;
 class FilterItem;
 class KeyframeMultiSelection;
 class MultiPictureButton;
+struct ParameterControlInfo;
 enum class ScrollCode : std::int32_t;
 
 // Bits that change how the list builds and draws (see HasECPStyle). The effect controls panel
@@ -284,12 +285,11 @@ class EffectControlsListView : public SubView, public Listener {
   virtual void PaintBackground(DC& dc);
   // Draws one section: its header (unless `label` is empty) and, when `expanded`, its rows.
   // Returns whether a drop indicator belongs under the section.
-  bool DrawItemList(DC& dc, const EffectItemList& list, int headerTop, const std::string& label,
-                    bool expanded, int flag);
+  virtual bool DrawItemList(DC& dc, const EffectItemList& list, int headerTop,
+                            const std::string& label, bool expanded, int flag);
   virtual void DrawItem(DC& dc, EffectItem& row, const Rect& rect, int flag);
   virtual void DrawFilterItem(DC& dc, FilterItem& row, const Rect& rect, int flag);
   void DrawFolderItem(DC& dc, EffectItem& row, const Rect& rect, const Rect& clip, int flag);
-  void DrawXOEditableTextSection(DC& dc, const std::string& label, bool expanded);
 
  protected:
   void FinishCreateSelf() override;
@@ -312,14 +312,19 @@ class EffectControlsListView : public SubView, public Listener {
   void StopListeningTo(const StationName& station);
   void NewKeyframeSelection();
   void FinishAndShowRows(const EffectItemList& list);
-  // The running layout of PositionItems and GetMaxHeight; places rows only with `place`.
-  int LayOutSections(bool place);
+  // The one layout walk behind PositionItems and GetMaxHeight: section headers and top rows
+  // from the top of the content down; `sink` (null: only measure) receives the placements.
+  // Returns the bottom of the content in view coordinates.
+  class LayoutSink;
+  int WalkLayout(LayoutSink* sink) const;
   void AfterLayoutChange();
   void ShowSectionRows(const EffectItemList& list, bool show);
   void AutoSelectNthEmbeddedEffect();
-  // Walks every row of every section in display order.
-  void ForEachSectionRow(
-      const std::function<void(const std::shared_ptr<EffectItem>&)>& visit) const;
+  // Every top row of every section, in display order.
+  void ForEachTopRow(const std::function<void(const std::shared_ptr<EffectItem>&)>& visit) const;
+  ParameterControlInfo MakeParameterInfo(const TrackItemRef& trackItem,
+                                         const ComponentRef& component,
+                                         const ComponentParamRef& param, bool masterClipMode) const;
 
   TargetKind mTargetKind = kTargetTransition;
   bool mVideoExpanded = false;
@@ -362,11 +367,14 @@ class EffectControlsListView : public SubView, public Listener {
   EffectControlsListScroller* mScroller = nullptr;  // not owned; see SetEffectControlsView
   int mVideoHeaderTop = -1;
   int mGraphicsHeaderTop = -1;
-  int mTextHeaderTop = -1;
 
   TickTime mVisibleKeyframeTime = 0;
   double mTimePerPixel = 0.0;
   FrameRate mPixelFrameRate;
+
+  // The selection the list was last built for, and whether a build ran since the last clear.
+  std::vector<TrackItemGroup> mTargetSelection;
+  bool mBuilt = false;
 
   bool mPendingAutoSelect = false;
   int mPendingAutoSelectIndex = -1;

@@ -1,0 +1,467 @@
+// Construction, listening, commands, selection, the shared time state and the state dump of
+// the effect list. Building, layout and painting live in the files named after them.
+#include "Handlers/EffectControls/Public/EffectControlsListView.h"
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <utility>
+
+#include "Handlers/EffectControls/Src/AudioPartInfo.h"
+#include "Handlers/EffectControls/Src/EffectControlsMessages.h"
+#include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Handlers/EffectControls/Src/ParameterRowFactory.h"
+#include "Host/Messaging/Station.h"
+#include "Host/Model/EditPermissions.h"
+#include "Host/Model/KeyframeMultiSelection.h"
+#include "Host/Model/MasterClip.h"
+#include "Host/Model/ModelMessages.h"
+#include "Host/Model/Sequence.h"
+#include "Host/Model/TrackItem.h"
+#include "Host/Rows/EffectItem.h"
+#include "Host/Rows/ParameterControl.h"
+#include "Host/Shell/ShellMessages.h"
+#include "Host/Toolkit/ControlMessages.h"
+#include "Host/Toolkit/MultiPictureButton.h"
+
+namespace {
+
+// Stations the list listens on besides the model's: effect filters announce UI updates on the
+// first, text rows their size changes on the second.
+constexpr const char* kVideoFilterNotifierStation = "ML.VideoFilterNotifierStation";
+constexpr const char* kTextControlResizeStation = "HSL.textcontrol.resize";
+
+// The view mode a selection logic asks for before it targets a transition.
+constexpr int kTransitionViewMode = 3;
+
+// One video and one audio item of the same linked clip, each in a group of its own.
+bool IsValidLinkedTrackItems(const std::vector<TrackItemGroup>& groups) {
+  if (groups.size() != 2) {
+    return false;
+  }
+  TrackItemRef video;
+  TrackItemRef audio;
+  for (const TrackItemGroup& group : groups) {
+    if (group.videoItems.size() == 1 && group.audioItems.empty()) {
+      video = group.videoItems.front();
+    } else if (group.audioItems.size() == 1 && group.videoItems.empty()) {
+      audio = group.audioItems.front();
+    }
+  }
+  return video && audio && video->IsClip() && audio->IsClip() && video->GetLinkGroup() != 0 &&
+         video->GetLinkGroup() == audio->GetLinkGroup();
+}
+
+void AppendDumpRows(const std::shared_ptr<EffectItem>& row, std::vector<std::string> path,
+                    std::vector<StateDumpRow>& rows) {
+  path.push_back(row->GetName());
+  StateDumpRow dump;
+  dump.path = path;
+  dump.className = ParameterRowFactory::GetRowClassName(*row);
+  dump.top = row->GetTop();
+  dump.height = row->IsSetAside() ? 0 : row->Height();
+  dump.groupLevel = row->GetGroupLevel();
+  dump.expanded = row->IsExpanded();
+  dump.selected = row->IsSelected();
+  dump.setAside = row->IsSetAside();
+  dump.shown = row->IsShown();
+  rows.push_back(std::move(dump));
+  for (const auto& child : row->GetItems()) {
+    AppendDumpRows(child, path, rows);
+  }
+}
+
+}  // namespace
+
+EffectControlsListView::EffectControlsListView(Commander* parent, StationName ownStation)
+    : SubView(parent),
+      mOwnStation(std::move(ownStation)),
+      mEditTime(std::make_shared<TickTime>(0)),
+      mNormalFont(kFont_Normal),
+      mLabelFont(kFont_Normal) {
+  mKeyframeStation = RegisterUniqueStation(mOwnStation + ".Keyframes");
+  RegisterStation(mOwnStation);
+  for (const StationName& station :
+       {mOwnStation, StationName(kSequenceActivationStation),
+        StationName(kVideoFilterNotifierStation), StationName(kTextControlResizeStation)}) {
+    AddListener(station, *this);
+  }
+  SetTimePerPixel(1.0 / 25.0);
+}
+
+EffectControlsListView::~EffectControlsListView() {
+  // Rows broadcast while they are torn down (their controls leave this view); stop listening
+  // first so nothing reaches a half-destroyed list.
+  RemoveListenerFromAllStations(*this);
+  mVideoItems.Clear();
+  mGraphicsItems.Clear();
+  for (const auto& part : mAudioParts) {
+    part->Clear();
+  }
+  mAudioParts.clear();
+  DisposeStation(mKeyframeStation);
+}
+
+void EffectControlsListView::FinishCreateSelf() {
+  if (!HasECPStyle(kStyleNoVideoExpander)) {
+    CreateVideoExpanderButton();
+  }
+  if (!HasECPStyle(kStyleNoXOTextExpander)) {
+    CreateXOEditableTextExpanderButton();
+  }
+  CreateGraphicsExpanderButton();
+  mImageList.Add(kDirectManipulationDecal);
+  SetAcceptsDrops(true);
+}
+
+void EffectControlsListView::DestroySelf() {
+  RemoveListenerFromAllStations(*this);
+  ClearList();
+}
+
+// --- Target ---
+
+void EffectControlsListView::SetSequence(const SequenceRef& sequence) {
+  if (mSequence == sequence) {
+    return;
+  }
+  if (mSequence) {
+    StopListeningTo(mSequence->GetStation());
+  }
+  mSequence = sequence;
+  if (mSequence) {
+    ListenTo(mSequence->GetStation());
+    *mEditTime = mSequence->GetCurrentTime();
+  }
+}
+
+void EffectControlsListView::DoSequenceClipSelectionChanged(const SequenceRef& sequence) {
+  SetSequence(sequence);
+  const TargetKind oldKind = mTargetKind;
+  const bool oldShowVideo = mShowVideo;
+  const bool oldShowAudio = mShowAudio;
+  const ComponentChainRef oldTransitionChain = mTransitionChain;
+
+  mShowVideo = false;
+  mShowAudio = false;
+  mTransitionChain.reset();
+  mTargetKind = kTargetClip;
+
+  std::vector<TrackItemGroup> groups;
+  if (mSequence) {
+    groups = mSequence->GetSelection();
+  }
+  if (groups.size() == 1) {
+    const TrackItemGroup& group = groups.front();
+    if (group.videoItems.size() == 1) {
+      const TrackItemRef& item = group.videoItems.front();
+      if (item->IsClip()) {
+        mShowVideo = true;
+        mShowAudio = !group.audioItems.empty();
+      } else if (item->IsTransition() && AllowsViewMode(kTransitionViewMode)) {
+        mTargetKind = kTargetTransition;
+        mShowVideo = true;
+        if (item->HasOwnComponentChain()) {
+          mTransitionChain = item->GetComponentChain();
+          mTargetKind = kTargetTransitionComponent;
+        }
+      }
+    } else if (group.videoItems.empty() && !group.audioItems.empty()) {
+      const TrackItemRef& item = group.audioItems.front();
+      if (item->IsClip()) {
+        mShowAudio = true;
+      } else if (group.audioItems.size() == 1 && item->IsTransition() &&
+                 AllowsViewMode(kTransitionViewMode)) {
+        mTargetKind = kTargetTransition;
+        mShowAudio = true;
+      }
+    }
+  } else if (IsValidLinkedTrackItems(groups)) {
+    mShowVideo = true;
+    mShowAudio = true;
+  }
+
+  const bool sameTarget = mTargetKind == oldKind && mShowVideo == oldShowVideo &&
+                          mShowAudio == oldShowAudio && mTransitionChain == oldTransitionChain &&
+                          groups == mTargetSelection && mBuilt;
+  mTargetSelection = std::move(groups);
+  if (sameTarget) {
+    UpdateParamsUI(*mEditTime, true);
+    Invalidate();
+    return;
+  }
+  ClearAndRebuildList();
+}
+
+bool EffectControlsListView::IsReadOnlyEffectContainer() const {
+  if (mMasterClip) {
+    if (EditPermissions::IsReadOnly(*mMasterClip)) {
+      return true;
+    }
+    return mMasterClip->GetProperties().GetBool(kPropertyKey_FromInactiveProject, false);
+  }
+  if (mSequence) {
+    return EditPermissions::IsReadOnly(*mSequence);
+  }
+  return false;
+}
+
+bool EffectControlsListView::ShouldAllowParameter(const ComponentRef& /*component*/,
+                                                  const ComponentParamRef& /*param*/) {
+  return true;
+}
+
+bool EffectControlsListView::AllowsViewMode(int /*viewMode*/) const {
+  return true;
+}
+
+// --- Selections ---
+
+void EffectControlsListView::SelectItem(const std::shared_ptr<EffectItem>& row, bool select) {
+  auto* filter = dynamic_cast<FilterItem*>(row.get());
+  if (filter == nullptr) {
+    return;
+  }
+  const ComponentRef& component = filter->Component();
+  const TrackItemRef& trackItem = filter->GetTrackItem();
+  const bool found = mSelectedFilters.Contains(component.get(), trackItem.get());
+  if (select && !found) {
+    mSelectedFilters.Add(component, trackItem);
+  } else if (!select && found) {
+    mSelectedFilters.Remove(component.get(), trackItem.get());
+  }
+  filter->SetSelected(select);
+}
+
+void EffectControlsListView::SelectParameter(const std::shared_ptr<EffectItem>& row, bool select) {
+  auto* parameter = dynamic_cast<ParameterControl*>(row.get());
+  if (parameter == nullptr || !parameter->GetParam()) {
+    return;
+  }
+  const ComponentParamRef& param = parameter->GetParam();
+  const bool found = mSelectedParameters.Contains(param.get());
+  if (select && !found) {
+    mSelectedParameters.Add(parameter->GetComponent(), param, parameter->GetTrackItem());
+  } else if (!select && found) {
+    mSelectedParameters.Remove(param.get());
+  }
+  parameter->SetSelected(select);
+}
+
+void EffectControlsListView::ClearSelection() {
+  if (mSelectedFilters.IsEmpty() && mSelectedParameters.IsEmpty()) {
+    Invalidate();
+    return;
+  }
+  mSelectedFilters.Clear();
+  mSelectedParameters.Clear();
+  auto clearFlags = [](const EffectItemList& list) {
+    list.ForEachRow([](const EffectItemList::Row& row) {
+      row->SetSelected(false);
+      return true;
+    });
+  };
+  clearFlags(mVideoItems);
+  clearFlags(mGraphicsItems);
+  for (const auto& part : mAudioParts) {
+    if (part->IsClipPart()) {
+      clearFlags(part->GetItems());
+    }
+  }
+  BroadcastMessage(mOwnStation, EffectControlsFilterSelectionChangedMessage());
+  Invalidate();
+}
+
+void EffectControlsListView::AutoSelectNthEmbeddedEffect() {
+  if (!mPendingAutoSelect) {
+    return;
+  }
+  mPendingAutoSelect = false;
+  const EffectItemList& list = mVideoItems.IsEmpty() ? mGraphicsItems : mVideoItems;
+  if (mPendingAutoSelectIndex < 0 ||
+      static_cast<std::size_t>(mPendingAutoSelectIndex) >= list.Size()) {
+    return;
+  }
+  ClearSelection();
+  SelectItem(list[static_cast<std::size_t>(mPendingAutoSelectIndex)], true);
+  Invalidate();
+}
+
+// --- Messages and commands ---
+
+void EffectControlsListView::ListenToMessage(const Message& message) {
+  if (message.Is<EffectControlsDisclosureStateChanged>()) {
+    OnDisclosureStateChanged();
+  } else if (const auto* all = message.As<DisclosureStateAllChanged>()) {
+    OnDisclosureStateAllChanged(all->expanded);
+  } else if (message.Is<FilterItemNameChanged>()) {
+    Invalidate();
+  } else if (const auto* added = message.As<EmbeddedEffectAdded>()) {
+    // Remember where the pasted effect will be once the list is rebuilt.
+    const EffectItemList& list = mVideoItems.IsEmpty() ? mGraphicsItems : mVideoItems;
+    int index = 0;
+    for (const auto& row : list) {
+      if (const auto* filter = dynamic_cast<const FilterItem*>(row.get());
+          filter != nullptr && filter->Component() == added->component) {
+        mPendingAutoSelectIndex = index;
+        mPendingAutoSelect = true;
+        break;
+      }
+      ++index;
+    }
+  } else if (message.Is<ParameterControlChangedMessage>()) {
+    BroadcastRefreshKeyframes();
+    if (mVideoLimiterPresent) {
+      bool changed = false;
+      for (const EffectItemList* list : {&mVideoItems, &mGraphicsItems}) {
+        for (const auto& row : *list) {
+          changed = row->RecursiveUpdateSetAside() || changed;
+        }
+      }
+      if (changed) {
+        PositionItems();
+        UpdateVScrollBar();
+      }
+    }
+    BroadcastListChanged();
+  } else if (message.Is<ParameterControlMinMaxChangedMessage>()) {
+    Invalidate();
+  } else if (const auto* scroll = message.As<ScrollVerticalMessage>()) {
+    OnVScroll(scroll->code, scroll->position, scroll->flags);
+  } else if (message.Is<ComponentChainChangedMessage>()) {
+    PostMessageToUIThread(mKeyframeStation,
+                          std::make_shared<EffectControlsRefreshKeyframesMessage>());
+  } else if (message.Is<ComponentChainStructureChangedMessage>()) {
+    ClearAndRebuildList();
+  } else if (message.Is<TrackItemChangedMessage>()) {
+    ResetTimes();
+    PostMessageToUIThread(mKeyframeStation,
+                          std::make_shared<EffectControlsRefreshKeyframesMessage>());
+  } else if (const auto* position = message.As<PlayerPositionChangedMessage>()) {
+    if (position->playMode == kPlayModePlaying || position->playMode == kPlayModeScrubbing) {
+      UpdateParamsUI(position->time, false);
+    }
+  } else if (message.Is<ReadOnlyStateChangedMessage>()) {
+    ClearAndRebuildList();
+  }
+}
+
+bool EffectControlsListView::FindCommandStatus(CommandID command, CommandStatus& status) {
+  if (command == kVideoExpanderCommand || command == kGraphicsExpanderCommand ||
+      command == kTextExpanderCommand ||
+      (command >= kAudioExpanderCommand && command < kAudioExpanderCommand + kMaxAudioParts)) {
+    status.enabled = true;
+    return true;
+  }
+  if (command >= kPlayAudioPartCommand && command < kPlayAudioPartCommand + kMaxAudioParts) {
+    status.enabled = CanPlayAudioPart(command - kPlayAudioPartCommand);
+    return true;
+  }
+  return SubView::FindCommandStatus(command, status);
+}
+
+bool EffectControlsListView::ObeyCommand(CommandID command) {
+  if (command == kVideoExpanderCommand) {
+    OnVideoExpander();
+    return true;
+  }
+  if (command == kGraphicsExpanderCommand) {
+    OnGraphicsExpander();
+    return true;
+  }
+  if (command == kTextExpanderCommand) {
+    OnXOEditableTextExpander();
+    return true;
+  }
+  if (command >= kAudioExpanderCommand && command < kAudioExpanderCommand + kMaxAudioParts) {
+    OnAudioExpander(command);
+    return true;
+  }
+  return SubView::ObeyCommand(command);
+}
+
+void EffectControlsListView::BroadcastListChanged() {
+  BroadcastMessage(mOwnStation, EffectControlsListChangedMessage());
+}
+
+void EffectControlsListView::BroadcastRefreshKeyframes() {
+  BroadcastMessage(mKeyframeStation, EffectControlsRefreshKeyframesMessage());
+}
+
+void EffectControlsListView::ListenTo(const StationName& station) {
+  if (!station.empty()) {
+    AddListener(station, *this);
+  }
+}
+
+void EffectControlsListView::StopListeningTo(const StationName& station) {
+  if (!station.empty()) {
+    RemoveListener(station, *this);
+  }
+}
+
+// --- Shared time state ---
+
+bool EffectControlsListView::SetTimePerPixel(double secondsPerPixel) {
+  // Zero, negative or NaN would make every pixel last no time at all (or less): refused.
+  if (!(secondsPerPixel > 0.0)) {
+    return false;
+  }
+  if (secondsPerPixel == mTimePerPixel) {
+    return false;
+  }
+  mTimePerPixel = secondsPerPixel;
+  const double pixelsPerSecond = 1.0 / secondsPerPixel;
+  TickTime ticks = std::numeric_limits<TickTime>::max();
+  if (pixelsPerSecond != 0.0) {
+    const double exact = std::trunc(static_cast<double>(kTicksPerSecond) / pixelsPerSecond);
+    // Finer than one tick a pixel cannot be counted in whole ticks; huge spans saturate.
+    ticks = exact < 1.0 ? 1
+            : exact >= static_cast<double>(std::numeric_limits<TickTime>::max())
+                ? std::numeric_limits<TickTime>::max()
+                : static_cast<TickTime>(exact);
+  }
+  mPixelFrameRate = FrameRate::FromTicksPerFrame(ticks).value_or(FrameRate());
+  Invalidate();
+  return true;
+}
+
+bool EffectControlsListView::SetVisibleKeyframeTime(TickTime time) {
+  if (time == mVisibleKeyframeTime) {
+    return false;
+  }
+  mVisibleKeyframeTime = time;
+  Invalidate();
+  return true;
+}
+
+// --- State dump ---
+
+std::vector<StateDumpRow> EffectControlsListView::GetDumpRows() const {
+  std::vector<StateDumpRow> rows;
+  auto dumpList = [&rows](const EffectItemList& list) {
+    for (const auto& row : list) {
+      AppendDumpRows(row, {}, rows);
+    }
+  };
+  dumpList(mGraphicsItems);
+  dumpList(mVideoItems);
+  for (const auto& part : mAudioParts) {
+    dumpList(part->GetItems());
+  }
+  return rows;
+}
+
+void EffectControlsListView::ForEachTopRow(
+    const std::function<void(const std::shared_ptr<EffectItem>&)>& visit) const {
+  for (const EffectItemList* list : {&mGraphicsItems, &mVideoItems}) {
+    for (const auto& row : *list) {
+      visit(row);
+    }
+  }
+  for (const auto& part : mAudioParts) {
+    for (const auto& row : part->GetItems()) {
+      visit(row);
+    }
+  }
+}
