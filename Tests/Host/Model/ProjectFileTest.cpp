@@ -3,6 +3,7 @@
 #include <filesystem>
 #include <fstream>
 #include <nlohmann/json.hpp>
+#include <set>
 #include <sstream>
 
 #include "Host/Model/ComponentChainActions.h"
@@ -237,6 +238,63 @@ TEST_F(ProjectFileTest, SavingIsAtomicAndAFailedSaveKeepsTheOldFile) {
   EXPECT_EQ(ProjectFile::Load((dir / "missing.json").string()).error,
             (dir / "missing.json").string() + ": cannot open");
   std::filesystem::remove_all(dir);
+}
+
+}  // namespace
+
+namespace {
+
+// The example projects are generated (Apps/examplegen); they must load and save back unchanged,
+// so the format and the files never drift apart.
+TEST(ExampleProjects, LoadAndSaveBackByteForByte) {
+  MessagingTestScope messaging;
+  int checked = 0;
+  for (const auto& entry : std::filesystem::directory_iterator("examples")) {
+    if (entry.path().extension() != ".json")
+      continue;
+    std::ifstream in(entry.path());
+    std::stringstream content;
+    content << in.rdbuf();
+    const auto loaded = ProjectFile::LoadFromString(content.str());
+    ASSERT_TRUE(loaded) << entry.path() << ": " << loaded.error;
+    EXPECT_EQ(ProjectFile::SaveToString(*loaded.project), content.str()) << entry.path();
+    ++checked;
+  }
+  EXPECT_GE(checked, 1);
+}
+
+TEST(ExampleProjects, TheDemoHoldsEveryCaseThePanelShows) {
+  MessagingTestScope messaging;
+  const auto loaded = ProjectFile::Load("examples/demo.json");
+  ASSERT_TRUE(loaded) << loaded.error;
+  const auto& sequence = loaded.project->GetActiveSequence();
+  ASSERT_TRUE(sequence);
+  ASSERT_EQ(sequence->GetSelection().size(), 1u) << "opens with a clip selected";
+  const auto& group = sequence->GetSelection()[0];
+  EXPECT_EQ(group.audioItems.size(), 3u) << "linked audio in three parts";
+  std::set<TemporalInterpolation> modes;
+  for (const auto& component : group.videoItems[0]->GetComponentChain()->GetComponents()) {
+    for (const auto& param : component->GetParams()) {
+      for (const auto& k : param->GetKeyframes().Keyframes())
+        modes.insert(k.interpolation);
+    }
+  }
+  EXPECT_EQ(modes.size(), 5u) << "keyframes of every temporal interpolation";
+  int videoTransitions = 0, audioTransitions = 0, graphics = 0;
+  sequence->ForEachTrackItem([&](const TrackItemRef& item) {
+    if (item->IsTransition()) {
+      (item->GetMediaType() == MediaType::Video ? videoTransitions : audioTransitions)++;
+    }
+    graphics += item->IsGraphicsClip() ? 1 : 0;
+  });
+  EXPECT_EQ(videoTransitions, 1);
+  EXPECT_EQ(audioTransitions, 1);
+  EXPECT_EQ(graphics, 1);
+  bool masterClipEffect = false;
+  for (const auto& clip : loaded.project->GetMasterClips()) {
+    masterClipEffect |= clip->GetVideoChain()->GetCount() > 0;
+  }
+  EXPECT_TRUE(masterClipEffect);
 }
 
 }  // namespace
