@@ -169,7 +169,10 @@ void KeyframeMultiSelectionActor::Apply(TickTime timeDelta, double valueDelta) {
     if (valueDelta != 0.0 && entry.param->GetValueKind() == ParamValueKind::Double) {
       for (TickTime time : moved) {
         const std::size_t index = *state.keyframes.FindAt(time);
-        const double value = std::get<double>(state.keyframes.At(index).value) + valueDelta;
+        const double current = std::get<double>(state.keyframes.At(index).value);
+        const double value = mScaleDB && entry.param->GetType() == ParamType::AudioGain
+                                 ? current * std::pow(10.0, valueDelta / 20.0)
+                                 : current + valueDelta;
         if (auto accepted = entry.param->Coerce(ParamValue(value))) {
           state.keyframes.SetValue(index, *accepted);
         }

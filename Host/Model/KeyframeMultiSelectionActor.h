@@ -52,6 +52,9 @@ class KeyframeMultiSelectionActor {
   // Moves to `timeDelta` (limited) and `valueDelta` from the origin of the gesture. False, with
   // nothing changed, on a read-only selection or project.
   bool MoveSelectionTo(TickTime timeDelta, double valueDelta = 0.0);
+  // Value deltas of audio gain parameters in decibels (a linear gain g becomes g * 10^(dB / 20)),
+  // as their graphs show them; off by default. Set it before moving.
+  void SetScaleDB(bool scaleDB) { mScaleDB = scaleDB; }
   TickTime GetTimeDelta() const { return mTimeDelta; }
   double GetValueDelta() const { return mValueDelta; }
   bool HasMoved() const { return mTimeDelta != 0 || mValueDelta != 0.0; }
@@ -82,4 +85,5 @@ class KeyframeMultiSelectionActor {
   TickTime mTimeDelta = 0;
   double mValueDelta = 0.0;
   bool mCommitted = false;
+  bool mScaleDB = false;
 };

@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <memory>
 
 #include "Host/Messaging/Diagnostics.h"
@@ -301,6 +302,20 @@ TEST_F(KeyframeSelectionTest, ReadOnlyProjectAllowsNoMove) {
   EXPECT_EQ(actor.MoveSelection(kFrame25), 0);
   EXPECT_FALSE(actor.MoveSelectionTo(kFrame25));
   EXPECT_EQ(Times(blurriness)[1], 3 * kSec);
+}
+
+TEST_F(KeyframeSelectionTest, GainKeyframesMoveInDecibelsWhenAskedTo) {
+  const ComponentRef volume = aAudio->GetComponentChain()->FindByMatchName(kMatchName_Volume);
+  const ComponentParamRef level = volume->FindParam("Level");
+  Keys(level, {{3 * kSec, 1.0}});
+  ASSERT_TRUE(selection->AddItem(aAudio, volume, level, 3 * kSec));
+  KeyframeMultiSelectionActor actor(sequence, selection);
+  actor.SetScaleDB(true);
+  ASSERT_TRUE(actor.MoveSelectionTo(0, -6.0));
+  EXPECT_NEAR(*level->GetScalarAt(3 * kSec), std::pow(10.0, -6.0 / 20.0), 1e-12);
+  actor.SetScaleDB(false);
+  ASSERT_TRUE(actor.MoveSelectionTo(0, 0.5));
+  EXPECT_NEAR(*level->GetScalarAt(3 * kSec), 1.5, 1e-12);
 }
 
 // --- Clipboard ---
