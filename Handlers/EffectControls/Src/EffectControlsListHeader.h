@@ -1,7 +1,9 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 #include "Host/Model/ModelRefs.h"
 #include "Host/Toolkit/Font.h"
@@ -25,6 +27,16 @@ class EffectControlsListHeader : public SubView {
   static constexpr int kExpanderRightInset = 20;  // expander x = width - this
   static constexpr int kExpanderTop = 16;
   static constexpr int kUsesZoneWidth = 21;
+  // The uses popup's entries carry these commands (first + index).
+  static constexpr CommandID kFirstUseCommand = 18700;
+  static constexpr int kMaxUses = 100;
+
+  // One use of the targeted clip's master clip in the project's sequences.
+  struct Use {
+    SequenceRef sequence;
+    TrackItemRef item;
+    std::string label;  // "sequence : start timecode"
+  };
 
   // `superCommander`: where the expander's command goes (the panel view; null: the parent).
   explicit EffectControlsListHeader(Commander* superCommander = nullptr);
@@ -53,6 +65,15 @@ class EffectControlsListHeader : public SubView {
   std::string GetSequenceGroupText() const;
   MultiPictureButton* GetExpander() const { return mExpander.get(); }
 
+  // Called by a click on the master group (match frame): the panel shows the master clip.
+  void SetMasterClipHandler(std::function<void(const MasterClipRef&)> handler) {
+    mMasterClipHandler = std::move(handler);
+  }
+  // Called after a click on the sequence group took the panel back into the sequence.
+  void SetSequenceHandler(std::function<void()> handler) { mSequenceHandler = std::move(handler); }
+  // The video uses of the targeted clip's master clip, in sequence and track order.
+  std::vector<Use> GetMasterClipUses() const;
+
   // The zone under `point` (local coordinates); kZoneNone outside clip mode.
   Zone HitTestZone(Point point) const;
   std::string GetToolTipText(Point point) const;
@@ -61,6 +82,8 @@ class EffectControlsListHeader : public SubView {
   void SetBoundsSelf(const Rect& bounds) override;
   void PaintSelf(DC& dc) override;
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
+  // The uses popup's entries; other commands go up the chain.
+  bool ObeyCommand(CommandID command) override;
 
  private:
   Rect GetTextRect() const;
@@ -91,4 +114,7 @@ class EffectControlsListHeader : public SubView {
   std::string mClipName;
   std::string mSequenceName;
   Font mFont;
+  std::vector<Use> mUses;  // of the last uses popup
+  std::function<void(const MasterClipRef&)> mMasterClipHandler;
+  std::function<void()> mSequenceHandler;
 };

@@ -1,0 +1,204 @@
+#include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
+
+#include <algorithm>
+#include <cmath>
+#include <functional>
+
+#include "Handlers/EffectControls/Public/EffectControlsListView.h"
+#include "Handlers/EffectControls/Src/AudioPartInfo.h"
+#include "Host/Model/ComponentParam.h"
+#include "Host/Model/Keyframe.h"
+#include "Host/Model/KeyframeCurve.h"
+#include "Host/Model/KeyframeMultiSelection.h"
+#include "Host/Rows/EffectItem.h"
+#include "Host/Rows/ParameterControl.h"
+#include "Host/Toolkit/Bitmap.h"
+#include "Host/Toolkit/ColorManager.h"
+#include "Host/Toolkit/DC.h"
+#include "Host/Toolkit/Decals.h"
+#include "Host/Toolkit/ImageList.h"
+
+namespace {
+
+constexpr double kTicksPerSecondD = 254016000000.0;
+
+// The panel's colour when its set is registered, else the toolkit's.
+Color PanelColor(std::string_view key, std::string_view fallback) {
+  return ColorManager::HasColor(key) ? ColorManager::GetColor(key)
+                                     : ColorManager::GetColor(fallback);
+}
+
+// Glyph kind in the keyframe image order (Linear, Bezier, AutoBezier, Hold, ...).
+int GlyphKind(TemporalInterpolation interpolation) {
+  switch (interpolation) {
+    case TemporalInterpolation::Hold:
+      return 3;
+    case TemporalInterpolation::Bezier:
+    case TemporalInterpolation::ContinuousBezier:
+      return 1;
+    case TemporalInterpolation::AutoBezier:
+      return 2;
+    case TemporalInterpolation::Linear:
+      break;
+  }
+  return 0;
+}
+
+void VisitRows(const EffectItemList& list,
+               const std::function<void(const std::shared_ptr<EffectItem>&)>& visit) {
+  std::function<void(const std::shared_ptr<EffectItem>&)> walk =
+      [&](const std::shared_ptr<EffectItem>& row) {
+        visit(row);
+        if (row->IsExpanded()) {
+          for (const auto& child : row->GetItems()) {
+            walk(child);
+          }
+        }
+      };
+  for (const auto& row : list) {
+    walk(row);
+  }
+}
+
+}  // namespace
+
+EffectControlsKeyframeView::EffectControlsKeyframeView(Commander* superCommander)
+    : SubView(superCommander) {}
+
+EffectControlsKeyframeView::~EffectControlsKeyframeView() = default;
+
+void EffectControlsKeyframeView::SetPinToClip(bool pinned) {
+  mPinned = pinned;
+  Invalidate();
+}
+
+void EffectControlsKeyframeView::SetClipSpan(TickTime start, TickTime end) {
+  mClipStart = start;
+  mClipEnd = std::max(start, end);
+  Invalidate();
+}
+
+void EffectControlsKeyframeView::SetEditTime(TickTime time) {
+  if (time != mEditTime) {
+    mEditTime = time;
+    Invalidate();
+  }
+}
+
+TickTime EffectControlsKeyframeView::GetVisibleStartTime() const {
+  const auto list = mList.lock();
+  return list ? list->GetVisibleKeyframeTime() : 0;
+}
+
+double EffectControlsKeyframeView::GetSecondsPerPixel() const {
+  const auto list = mList.lock();
+  return list ? list->GetTimePerPixel() : 0.0;
+}
+
+double EffectControlsKeyframeView::TimeToX(TickTime time) const {
+  const double secondsPerPixel = GetSecondsPerPixel();
+  if (!(secondsPerPixel > 0.0)) {
+    return 0.0;
+  }
+  return static_cast<double>(time - GetVisibleStartTime()) / (secondsPerPixel * kTicksPerSecondD);
+}
+
+TickTime EffectControlsKeyframeView::XToTime(double x) const {
+  return GetVisibleStartTime() +
+         static_cast<TickTime>(std::llround(x * GetSecondsPerPixel() * kTicksPerSecondD));
+}
+
+int EffectControlsKeyframeView::GetSelectedKeyframeCount() const {
+  const auto list = mList.lock();
+  if (!list || !list->GetKeyframeSelection()) {
+    return 0;
+  }
+  return static_cast<int>(list->GetKeyframeSelection()->GetKeyframeCount());
+}
+
+void EffectControlsKeyframeView::PaintSelf(DC& dc) {
+  const Rect bounds = GetLocalBounds();
+  const Color background =
+      PanelColor("colors.effectscontrols.keyframeview.background", kColor_ContentBackground);
+  const Color noClip =
+      PanelColor("colors.effectscontrols.keyframeview.noclipband", kColor_WindowBackground);
+  const Color separator =
+      PanelColor("colors.effectscontrols.keyframeview.Hseparator", kColor_ListBoxContentDivider);
+  const Color band =
+      PanelColor("colors.effectscontrols.keyframeview.trimband", kColor_ControlBackground);
+  const Color filterBackground =
+      PanelColor("colors.effectscontrols.keyframeview.filteritembkgd", kColor_ListBoxContentNormal);
+  dc.FillRect(bounds, noClip);
+
+  const auto list = mList.lock();
+  if (!list || !(list->GetTimePerPixel() > 0.0)) {
+    return;
+  }
+  // The clip's span is the area's working background; outside it the no-clip colour shows.
+  const int clipLeft = std::max(0, static_cast<int>(std::floor(TimeToX(mClipStart))));
+  const int clipRight = std::min(bounds.Width(), static_cast<int>(std::ceil(TimeToX(mClipEnd))));
+  if (clipRight > clipLeft) {
+    dc.FillRect(Rect{clipLeft, 0, clipRight, bounds.Height()}, background);
+  }
+
+  const TickTime trackStart = list->GetTrackItemStartTime();
+  const TickTime mediaIn = list->GetTrackItemMediaInTime();
+  const auto selection = list->GetKeyframeSelection();
+  const auto draw = [&](const std::shared_ptr<EffectItem>& row) {
+    if (!row->IsShown() || row->IsSetAside()) {
+      return;
+    }
+    const int top = row->GetTop();
+    const int height = row->Height();
+    if (top + height < 0 || top > bounds.Height()) {
+      return;
+    }
+    if (row->IsFilter()) {
+      // The effect's band: where the clip lies, across the effect's own title row.
+      if (clipRight > clipLeft) {
+        dc.FillRect(Rect{clipLeft, top + 1, clipRight, top + row->OwnHeight() - 1}, band);
+      }
+    } else if (row->IsFolder()) {
+      dc.FillRect(Rect{0, top, bounds.Width(), top + row->OwnHeight()}, filterBackground);
+    }
+    dc.FillRect(Rect{0, top + row->OwnHeight() - 1, bounds.Width(), top + row->OwnHeight()},
+                separator);
+
+    const auto* control = dynamic_cast<const ParameterControl*>(row.get());
+    if (control == nullptr || !control->GetParam() || !control->GetParam()->IsTimeVarying()) {
+      return;
+    }
+    const auto& keys = control->GetParam()->GetKeyframes().Keyframes();
+    const int centreY = top + row->OwnHeight() / 2;
+    for (std::size_t i = 0; i < keys.size(); ++i) {
+      const TickTime sequenceTime = control->GetTrackItem()
+                                        ? control->ClipTimeToSequenceTime(keys[i].time)
+                                        : keys[i].time - mediaIn + trackStart;
+      const int x = static_cast<int>(std::lround(TimeToX(sequenceTime)));
+      if (x < -8 || x > bounds.Width() + 8) {
+        continue;
+      }
+      const bool selected =
+          selection && selection->Contains(control->GetParam().get(), keys[i].time);
+      const int variant = (selected ? 3 : 0);
+      const int index = 6 * GlyphKind(keys[i].interpolation) + variant;
+      if (mImages && index < mImages->GetCount()) {
+        mImages->Draw(dc, index, Point{x - 7, centreY - 8});
+      } else {
+        dc.DrawBitmap(*Bitmap::GetBitmap(static_cast<Decal>(index)), Point{x - 7, centreY - 8});
+      }
+    }
+  };
+  VisitRows(list->GetVideoItems(), draw);
+  VisitRows(list->GetGraphicsItems(), draw);
+  for (const auto& part : list->GetAudioParts()) {
+    VisitRows(part->GetItems(), draw);
+  }
+
+  // The current time across every track.
+  const int x = static_cast<int>(std::lround(TimeToX(mEditTime)));
+  if (x >= 0 && x < bounds.Width()) {
+    dc.FillRect(Rect{x, 0, x + 1, bounds.Height()},
+                ColorManager::GetColor(kColor_CurrentTimeIndicator));
+  }
+}
