@@ -203,7 +203,8 @@ void EffectControlsView::LayoutPanel() {
   const int R = kScrollBarSize;
   const int T = EffectControlsTimeRuler::kRulerHeight;
 
-  const int L = std::max(kMinListWidth, static_cast<int>(static_cast<float>(W) * CurrentRatio()));
+  const int L = std::max(kMinListWidth,
+                         static_cast<int>(std::lround(static_cast<float>(W) * CurrentRatio())));
   const int K = std::max(1, W - S - L - kSeparatorGap);
   if (mKeyframesVisible) {
     mZoomLimiter.SetScrollWidth(K);
@@ -282,7 +283,8 @@ void EffectControlsView::ToggleKeyframesVisible() {
   const int W = GetBounds().Width();
   if (mKeyframesVisible && W > 0) {
     const int S = GetScrollBarWidth();
-    const int L = std::max(kMinListWidth, static_cast<int>(static_cast<float>(W) * CurrentRatio()));
+    const int L = std::max(kMinListWidth,
+                           static_cast<int>(std::lround(static_cast<float>(W) * CurrentRatio())));
     if (W - S - L - kSeparatorGap < kMinKeyframeWidth) {
       StoreRatio(static_cast<float>(std::max(kMinListWidth, W - S - kMinKeyframeWidth)) /
                  static_cast<float>(W));
