@@ -1,0 +1,488 @@
+#include <algorithm>
+
+#include "Handlers/EffectControls/Src/EffectControlsMessages.h"
+#include "Handlers/EffectControls/Src/ParameterRowFactory.h"
+#include "Host/Messaging/Diagnostics.h"
+#include "Host/Model/ComponentParam.h"
+#include "Host/Model/KeyframeMultiSelection.h"
+#include "Host/Toolkit/MultiPictureButton.h"
+#include "Tests/Handlers/EffectControls/EffectControlsListViewTestSupport.h"
+
+namespace {
+
+using Strings = std::vector<std::string>;
+
+// Text as the host stores it in binary parameter values: UTF-16, low byte first.
+ParamBlob WideText(std::string_view text) {
+  ParamBlob blob;
+  for (const char c : text) {
+    blob.bytes.push_back(static_cast<std::uint8_t>(c));
+    blob.bytes.push_back(0);
+  }
+  return blob;
+}
+
+ComponentRef CountedGroupEffect(std::string_view spans, std::vector<std::string> following) {
+  ComponentRef effect = Component::Create("XO.KRVN Test", "Test", MediaType::Video, false);
+  effect->AddParam(ComponentParam::Create("Counted", ParamType::GroupBegin, WideText(spans))
+                       ->SetGroupKind(GroupKind::Counted));
+  for (const std::string& name : following) {
+    effect->AddParam(ComponentParam::Create(name, ParamType::FloatSlider, 1.0));
+  }
+  return effect;
+}
+
+bool ClassIs(const EffectItem& row, std::string_view name) {
+  return ParameterRowFactory::GetRowClassName(row).starts_with(name);
+}
+
+TEST_F(ListViewTest, ClipListsIntrinsicsThenAppliedEffectsEachInReverseChainOrder) {
+  // I1, E1, I2, E2 in chain order.
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Motion), Make(kMatchName_GaussianBlur),
+                                         Make(kMatchName_Opacity), Make(kMatchName_Crop)});
+  Open();
+  Select({clip});
+
+  EXPECT_EQ(list->GetTargetKind(), EffectControlsListView::kTargetClip);
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Opacity", "Motion", "Crop", "Gaussian Blur"}));
+  EXPECT_TRUE(list->GetGraphicsItems().IsEmpty());
+  EXPECT_TRUE(list->IsVideoExpanded());
+  EXPECT_EQ(list->GetVideoTrackItem(), clip);
+  ASSERT_NE(list->GetKeyframeSelection(), nullptr);
+  EXPECT_EQ(list->GetKeyframeSelection()->GetSequence(), sequence);
+  ASSERT_NE(list->GetVideoExpander(), nullptr);
+  EXPECT_TRUE(list->GetVideoExpander()->IsVisible());
+  EXPECT_EQ(list->GetVideoExpander()->GetValue(), 0);
+  for (const auto& row : list->GetVideoItems()) {
+    EXPECT_TRUE(row->IsCreated());
+    EXPECT_TRUE(row->IsShown());
+  }
+}
+
+TEST_F(ListViewTest, TimeRemappingStyleBitDropsOnlyThatIntrinsic) {
+  const TrackItemRef clip = AddClip(v1, Catalogue().CreateIntrinsics(MediaType::Video));
+  Open();
+  Select({clip});
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Time Remapping", "Opacity", "Motion"}));
+
+  list->SetStyle(kStyleHideTimeRemapping);
+  list->ClearAndRebuildList();
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Opacity", "Motion"}));
+}
+
+TEST_F(ListViewTest, GraphicsClipMovesAppliedEffectsToTheGraphicsSectionInChainOrder) {
+  ComponentRef text = Component::Create("XO.KRVN TextLayer", "Text", MediaType::Video, false);
+  text->SetRole(ComponentRole::Graphics);
+  ComponentRef shape = Component::Create("XO.KRVN ShapeLayer", "Shape", MediaType::Video, false);
+  shape->SetRole(ComponentRole::Graphics);
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Motion), text, Make(kMatchName_Opacity),
+                                         shape, Make(kMatchName_GaussianBlur)});
+  Open();
+  Select({clip});
+
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Opacity", "Motion"}));
+  EXPECT_EQ(Titles(list->GetGraphicsItems()), (Strings{"Text", "Shape", "Gaussian Blur"}));
+  EXPECT_TRUE(list->IsGraphicsExpanded());
+  ASSERT_NE(list->GetGraphicsExpander(), nullptr);
+  EXPECT_TRUE(list->GetGraphicsExpander()->IsVisible());
+  // The graphics section comes first, the video section under it.
+  EXPECT_LT(list->GetGraphicsHeaderTop(), list->GetVideoHeaderTop());
+  EXPECT_EQ(list->GetGraphicsHeaderTop(), EffectControlsListView::kInitialBaseline);
+}
+
+TEST_F(ListViewTest, MasterClipModeShowsTheMasterClipsEffectsWithoutMaskShapesOrAudio) {
+  masterClip->GetVideoChain()->Append(Make(kMatchName_Tint));
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_GaussianBlur)});
+  const TrackItemRef sound = AddClip(a1, {Make(kMatchName_Volume)});
+  clip->SetLinkGroup(1);
+  sound->SetLinkGroup(1);
+  list->SetMasterClip(masterClip);
+  Open();
+  Select({clip});
+
+  ASSERT_TRUE(list->GetShowAudio());
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Tint"}));
+  EXPECT_EQ(list->GetVideoChain(), masterClip->GetVideoChain());
+  // Tint takes masks, but not in master-clip mode.
+  EXPECT_EQ(ChildTitles(*list->GetVideoItems().At(0)),
+            (Strings{"Map Black To", "Map White To", "Amount to Tint"}));
+  EXPECT_TRUE(list->GetAudioParts().empty());
+
+  // The same clip outside master-clip mode has its own effects and a mask-shape row.
+  list->ClearMasterClip();
+  list->ClearAndRebuildList();
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Opacity", "Gaussian Blur"}));
+  const EffectItem& blurRow = *list->GetVideoItems().At(1);
+  ASSERT_FALSE(blurRow.GetItems().empty());
+  EXPECT_TRUE(ClassIs(*blurRow.GetItems().front(), "MaskShapeControl"));
+  EXPECT_EQ(list->GetAudioParts().size(), 1u);
+}
+
+TEST_F(ListViewTest, AudioPartsFollowTheirOrderKeysAndOnlySeveralPartsGetPlayButtons) {
+  const TrackItemRef keyTwo = AddClip(a1, {Make(kMatchName_Volume)});
+  const TrackItemRef keyZero = AddClip(a2, {Make(kMatchName_Panner)});
+  const TrackItemRef keyOne = AddClip(a3, {Make(kMatchName_Delay)});
+  keyTwo->SetPartOrderKey(2);
+  keyZero->SetPartOrderKey(0);
+  keyOne->SetPartOrderKey(1);
+  for (const TrackItemRef& item : {keyTwo, keyZero, keyOne}) {
+    item->SetLinkGroup(4);
+  }
+  Open();
+  Select({keyTwo});
+
+  ASSERT_EQ(list->GetNumberOfAudioParts(), 3);
+  EXPECT_EQ(list->GetAudioParts()[0]->GetTrackItem(), keyZero);
+  EXPECT_EQ(list->GetAudioParts()[1]->GetTrackItem(), keyOne);
+  EXPECT_EQ(list->GetAudioParts()[2]->GetTrackItem(), keyTwo);
+  EXPECT_EQ(Titles(list->GetAudioParts()[0]->GetItems()), (Strings{"Panner"}));
+  for (int index = 0; index < 3; ++index) {
+    const AudioPartInfo& part = *list->GetAudioParts()[static_cast<std::size_t>(index)];
+    EXPECT_TRUE(part.IsExpanded());
+    ASSERT_NE(part.GetExpanderButton(), nullptr);
+    EXPECT_EQ(part.GetExpanderButton()->GetCommand(),
+              EffectControlsListView::kAudioExpanderCommand + index);
+    ASSERT_NE(part.GetPlayButton(), nullptr);
+    EXPECT_EQ(part.GetPlayButton()->GetCommand(),
+              EffectControlsListView::kPlayAudioPartCommand + index);
+    EXPECT_TRUE(part.GetPlayButton()->IsEnabled());
+  }
+  EXPECT_TRUE(list->GetVideoItems().IsEmpty());
+
+  Select({keyZero});  // same clip: nothing to rebuild
+  sequence->SetSelection({});
+  const TrackItemRef single = AddClip(a1, {Make(kMatchName_Volume)}, 20 * kSecond, 25 * kSecond);
+  Select({single});
+  ASSERT_EQ(list->GetNumberOfAudioParts(), 1);
+  EXPECT_EQ(list->GetAudioParts()[0]->GetPlayButton(), nullptr);
+  EXPECT_NE(list->GetAudioParts()[0]->GetExpanderButton(), nullptr);
+}
+
+TEST_F(ListViewTest, AudioPartsSharingAKeyAreAllShownInTrackOrder) {
+  // Regression: taking "the smallest key above the last one" lost every part after the first
+  // of equal keys (every new part has key 0).
+  const TrackItemRef left = AddClip(a1, {Make(kMatchName_Volume)});
+  const TrackItemRef right = AddClip(a2, {Make(kMatchName_Panner)});
+  const TrackItemRef ignored = AddClip(a3, {Make(kMatchName_Delay)});
+  ignored->SetPartOrderKey(10000);  // not a part
+  for (const TrackItemRef& item : {left, right, ignored}) {
+    item->SetLinkGroup(2);
+  }
+  Select({left});
+  ASSERT_EQ(list->GetNumberOfAudioParts(), 2);
+  EXPECT_EQ(list->GetAudioParts()[0]->GetTrackItem(), left);
+  EXPECT_EQ(list->GetAudioParts()[1]->GetTrackItem(), right);
+}
+
+TEST_F(ListViewTest, SlowedAudioPartCannotPlayOnItsOwn) {
+  const TrackItemRef first = AddClip(a1, {Make(kMatchName_Volume)});
+  const TrackItemRef second = AddClip(a2, {Make(kMatchName_Volume)});
+  first->SetLinkGroup(3);
+  second->SetLinkGroup(3);
+  second->SetPartOrderKey(1);
+  second->SetSpeed(0.5);
+  Open();
+  Select({first});
+  EXPECT_TRUE(list->CanPlayAudioPart(0));
+  EXPECT_FALSE(list->CanPlayAudioPart(1));
+  EXPECT_FALSE(list->CanPlayAudioPart(2));
+  EXPECT_FALSE(list->CanPlayAudioPart(-1));
+  EXPECT_FALSE(list->GetAudioParts()[1]->GetPlayButton()->IsEnabled());
+}
+
+TEST_F(ListViewTest, AudioEffectWithItsOwnWindowGetsTheTwoCustomRowsFirst) {
+  ComponentRef plugin = Make(kMatchName_Delay);
+  plugin->SetHasSetupDialog(true);
+  const TrackItemRef sound = AddClip(a1, {Make(kMatchName_Volume), plugin});
+  Select({sound});
+  ASSERT_EQ(list->GetNumberOfAudioParts(), 1);
+  const EffectItemList& rows = list->GetAudioParts()[0]->GetItems();
+  ASSERT_EQ(Titles(rows), (Strings{"Volume", "Delay"}));
+  const auto& children = rows.At(1)->GetItems();
+  ASSERT_EQ(children.size(), 5u);
+  EXPECT_TRUE(ClassIs(*children[0], "CustomAudioFilterItem"));
+  EXPECT_TRUE(ClassIs(*children[1], "CustomAudioFilterItem"));
+  EXPECT_EQ(ChildTitles(*rows.At(1)),
+            (Strings{children[0]->GetName(), children[1]->GetName(), "Delay", "Feedback", "Mix"}));
+  // An audio effect without its own window has none.
+  for (const auto& child : rows.At(0)->GetItems()) {
+    EXPECT_FALSE(ClassIs(*child, "CustomAudioFilterItem"));
+  }
+}
+
+TEST_F(ListViewTest, OfflineEffectShowsItsRowWithoutParameters) {
+  ComponentRef missing = Make(kMatchName_GaussianBlur);
+  missing->SetOffline(true);
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), missing});
+  Select({clip});
+  ASSERT_EQ(Titles(list->GetVideoItems()), (Strings{"Opacity", "Gaussian Blur"}));
+  EXPECT_TRUE(Filter(list->GetVideoItems(), 1).IsOffline());
+  EXPECT_TRUE(list->GetVideoItems().At(1)->GetItems().empty());
+  EXPECT_FALSE(list->GetVideoItems().At(0)->GetItems().empty());
+}
+
+class TransitionListTest : public ListViewTest {
+ protected:
+  TrackItemRef AddTransition(std::vector<ComponentRef> ownChain) {
+    TransitionData data;
+    data.matchName = "XO.KRVN CrossDissolve";
+    data.displayName = "Cross Dissolve";
+    TrackItemRef item =
+        TrackItem::CreateTransition(MediaType::Video, 6 * kSecond, 7 * kSecond, data);
+    for (const ComponentRef& component : ownChain) {
+      item->GetComponentChain()->Append(component);
+    }
+    v1->AddItem(item);
+    return item;
+  }
+};
+
+TEST_F(TransitionListTest, TransitionShowsOnlyItsRow) {
+  const TrackItemRef transition = AddTransition({});
+  Open();
+  Select({transition});
+  EXPECT_EQ(list->GetTargetKind(), EffectControlsListView::kTargetTransition);
+  ASSERT_EQ(list->GetVideoItems().Size(), 1u);
+  EXPECT_TRUE(ClassIs(*list->GetVideoItems().At(0), "VideoTransitionItem"));
+  EXPECT_EQ(list->GetVideoTrackItem(), transition);
+  EXPECT_FALSE(list->GetVideoExpander()->IsVisible());
+}
+
+TEST_F(TransitionListTest, OwnChainOfOneComponentShowsOnlyTheTransitionRow) {
+  const TrackItemRef transition = AddTransition({Make(kMatchName_Opacity)});
+  Open();
+  Select({transition});
+  EXPECT_EQ(list->GetTargetKind(), EffectControlsListView::kTargetTransitionComponent);
+  EXPECT_EQ(list->GetTransitionChain(), transition->GetComponentChain());
+  ASSERT_EQ(list->GetVideoItems().Size(), 1u);
+  EXPECT_TRUE(ClassIs(*list->GetVideoItems().At(0), "VideoTransitionItem"));
+}
+
+TEST_F(TransitionListTest, OwnChainOfTwoComponentsAddsAnEffectRowAfterTheTransition) {
+  const TrackItemRef transition =
+      AddTransition({Make(kMatchName_Opacity), Make(kMatchName_GaussianBlur)});
+  Open();
+  Select({transition});
+  ASSERT_EQ(list->GetVideoItems().Size(), 2u);
+  EXPECT_TRUE(ClassIs(*list->GetVideoItems().At(0), "VideoTransitionItem"));
+  EXPECT_EQ(Filter(list->GetVideoItems(), 1).Component(),
+            transition->GetComponentChain()->GetAt(1));
+  // No masks for a transition's effect.
+  for (const auto& child : list->GetVideoItems().At(1)->GetItems()) {
+    EXPECT_FALSE(ClassIs(*child, "MaskShapeControl"));
+  }
+}
+
+TEST_F(ListViewTest, NullGroupIsAFailedPreconditionAndBuildsNothing) {
+  ClearRecordedDebugAssertions();
+  list->RebuildVideoClipView(nullptr);
+  list->RebuildAudioClipView(nullptr);
+  list->RebuildTransitionView(nullptr);
+  list->RebuildTransitionComponentView(nullptr);
+  const auto& records = RecordedDebugAssertions();
+  ASSERT_EQ(records.size(), 4u);
+  for (const DebugAssertionRecord& record : records) {
+    EXPECT_EQ(record.message, "Invalid inTrackItemGroup");
+    EXPECT_EQ(record.condition, "inTrackItemGroup != NULL");
+    EXPECT_NE(record.function.find("EffectControlsListView::Rebuild"), std::string::npos);
+  }
+  EXPECT_TRUE(list->GetVideoItems().IsEmpty());
+  EXPECT_TRUE(list->GetAudioParts().empty());
+  EXPECT_FALSE(list->IsVideoExpanded());
+}
+
+TEST_F(ListViewTest, GroupHoldsTheParametersBetweenItsBeginAndEnd) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Timecode)});
+  Select({clip});
+  const EffectItem& timecode = *list->GetVideoItems().At(0);
+
+  // Group begin and end: the group holds what lies between them, the rest follows it.
+  ASSERT_EQ(ChildTitles(timecode), (Strings{"Position and Size", "Time Display", "Field Symbol",
+                                            "Starting Timecode", "Offset"}));
+  const EffectItem& group = *timecode.GetItems().front();
+  EXPECT_TRUE(group.IsGroupBegin());
+  EXPECT_EQ(ChildTitles(group), (Strings{"Position", "Size"}));
+  EXPECT_EQ(group.GetGroupLevel(), 0);
+  EXPECT_EQ(group.GetItems().front()->GetGroupLevel(), 1);
+  EXPECT_EQ(timecode.GetItems()[1]->GetGroupLevel(), 0);
+}
+
+TEST_F(ListViewTest, CountedGroupSpansAsManyParametersAsItsValueHasSemicolons) {
+  const TrackItemRef clip = AddClip(
+      v1, {CountedGroupEffect("Smoothness;Settings;", {"Smoothness", "Settings", "After"})});
+  Select({clip});
+  const EffectItem& row = *list->GetVideoItems().At(0);
+  ASSERT_EQ(ChildTitles(row), (Strings{"Counted", "After"}));
+  EXPECT_EQ(ChildTitles(*row.GetItems()[0]), (Strings{"Smoothness", "Settings"}));
+  EXPECT_EQ(row.GetItems()[0]->GetItems()[0]->GetGroupLevel(), 1);
+  EXPECT_EQ(row.GetItems()[1]->GetGroupLevel(), 0);
+
+  // No semicolon: an empty group.
+  list->ClearList();
+  const TrackItemRef empty =
+      AddClip(v1, {CountedGroupEffect("", {"After"})}, 20 * kSecond, 25 * kSecond);
+  Select({empty});
+  const EffectItem& emptyRow = *list->GetVideoItems().At(0);
+  ASSERT_EQ(ChildTitles(emptyRow), (Strings{"Counted", "After"}));
+  EXPECT_TRUE(emptyRow.GetItems()[0]->GetItems().empty());
+}
+
+TEST_F(ListViewTest, CountedGroupEndsEarlyWhenTheEffectRunsOutOfParameters) {
+  ComponentRef effect = CountedGroupEffect("a;b;c;d;", {"Only"});
+  // A stray group end closes nothing it should not.
+  effect->AddParam(ComponentParam::Create("", ParamType::GroupEnd, false));
+  const TrackItemRef clip = AddClip(v1, {effect});
+  Select({clip});
+  const EffectItem& row = *list->GetVideoItems().At(0);
+  ASSERT_EQ(ChildTitles(row), (Strings{"Counted"}));
+  EXPECT_EQ(ChildTitles(*row.GetItems()[0]), (Strings{"Only"}));
+}
+
+TEST_F(ListViewTest, MasksBecomeRowsUnderTheMaskShapeRowOneLevelDeeper) {
+  ComponentRef blur = Make(kMatchName_GaussianBlur);
+  blur->SetMasks({Make(kMatchName_Mask), Make(kMatchName_Mask)});
+  const TrackItemRef clip = AddClip(v1, {blur});
+  Select({clip});
+  const EffectItem& row = *list->GetVideoItems().At(0);
+  ASSERT_GE(row.GetItems().size(), 3u);
+  EXPECT_TRUE(ClassIs(*row.GetItems()[0], "MaskShapeControl"));
+  for (std::size_t i = 1; i <= 2; ++i) {
+    const auto* mask = dynamic_cast<const FilterItem*>(row.GetItems()[i].get());
+    ASSERT_NE(mask, nullptr);
+    EXPECT_TRUE(mask->IsMask());
+    EXPECT_EQ(mask->GetGroupLevel(), 1);
+    EXPECT_FALSE(mask->GetOptions().topLevel);
+  }
+  EXPECT_EQ(row.GetItems()[3]->GetName(), "Blurriness");
+
+  list->SetStyle(kStyleNoMaskControls);
+  list->ClearAndRebuildList();
+  EXPECT_EQ(ChildTitles(*list->GetVideoItems().At(0)),
+            (Strings{"Blurriness", "Blur Dimensions", "Repeat Edge Pixels"}));
+}
+
+TEST_F(ListViewTest, HiddenParametersAreSetAside) {
+  ComponentRef blur = Make(kMatchName_GaussianBlur);
+  blur->FindParam("Blur Dimensions")->SetVisible(false);
+  Select({AddClip(v1, {blur})});
+  const auto& children = list->GetVideoItems().At(0)->GetItems();
+  const auto hidden = std::find_if(children.begin(), children.end(), [](const auto& row) {
+    return row->GetName() == "Blur Dimensions";
+  });
+  ASSERT_NE(hidden, children.end());
+  EXPECT_TRUE((*hidden)->IsSetAside());
+  EXPECT_FALSE((*hidden)->IsShown());
+}
+
+TEST_F(ListViewTest, RebuildDestroysTheOldRowsAndAnnouncesTheNewList) {
+  ListMessageRecorder own;
+  ListMessageRecorder keyframes;
+  own.Listen(list->GetOwnStation());
+  keyframes.Listen(list->GetKeyframeViewStation());
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity)});
+  Open();
+  Select({clip});
+  const std::shared_ptr<EffectItem> before = list->GetVideoItems().At(0);
+  EXPECT_EQ(own.Count("EffectControlsListChangedMessage"), 1);
+  EXPECT_EQ(keyframes.Count("EffectControlsRefreshKeyframesMessage"), 1);
+
+  clip->GetComponentChain()->Append(Make(kMatchName_Crop));  // a structure change rebuilds
+  EXPECT_TRUE(before->IsDestroyed());
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Opacity", "Crop"}));
+  EXPECT_EQ(own.Count("EffectControlsListChangedMessage"), 2);
+
+  list->ClearList();
+  EXPECT_TRUE(list->GetVideoItems().IsEmpty());
+  EXPECT_FALSE(list->IsVideoExpanded());
+  EXPECT_FALSE(list->GetVideoExpander()->IsVisible());
+  EXPECT_EQ(list->GetVideoExpander()->GetValue(), 1);
+  EXPECT_EQ(list->GetVideoTrackItem(), nullptr);
+  EXPECT_EQ(list->GetKeyframeSelection(), nullptr);
+}
+
+TEST_F(ListViewTest, ClearSelectionEmptiesBothSelectionsAndEveryFlag) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_Crop)});
+  Select({clip});
+  ListMessageRecorder own;
+  own.Listen(list->GetOwnStation());
+
+  list->ClearSelection();  // nothing selected: no announcement
+  EXPECT_EQ(own.Count("EffectControlsFilterSelectionChangedMessage"), 0);
+
+  const auto& rows = list->GetVideoItems();
+  list->SelectItem(rows.At(0), true);
+  list->SelectItem(rows.At(1), true);
+  list->SelectItem(rows.At(1), true);  // twice is once
+  // Crop takes no masks: its first child is its first parameter.
+  list->SelectParameter(rows.At(1)->GetItems().front(), true);
+  EXPECT_EQ(list->GetSelectedItems().Size(), 2u);
+  EXPECT_EQ(list->GetSelectedParameters().Size(), 1u);
+  EXPECT_TRUE(rows.At(1)->IsSelected());
+
+  list->SelectItem(rows.At(0), false);
+  EXPECT_EQ(list->GetSelectedItems().Size(), 1u);
+  EXPECT_FALSE(rows.At(0)->IsSelected());
+
+  list->ClearSelection();
+  EXPECT_TRUE(list->GetSelectedItems().IsEmpty());
+  EXPECT_TRUE(list->GetSelectedParameters().IsEmpty());
+  EXPECT_FALSE(rows.At(1)->IsSelected());
+  EXPECT_FALSE(rows.At(1)->GetItems().front()->IsSelected());
+  EXPECT_EQ(own.Count("EffectControlsFilterSelectionChangedMessage"), 1);
+}
+
+TEST_F(ListViewTest, PastedEffectIsSelectedAfterTheRebuild) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_Crop)});
+  Select({clip});
+  const ComponentRef crop = clip->GetComponentChain()->GetAt(1);
+  BroadcastMessage(list->GetOwnStation(), EmbeddedEffectAdded(crop));
+  list->ClearAndRebuildList();
+  ASSERT_EQ(list->GetSelectedItems().Size(), 1u);
+  EXPECT_EQ(list->GetSelectedItems().At(0).component, crop);
+  EXPECT_TRUE(list->GetVideoItems().At(1)->IsSelected());
+  // Only once.
+  list->ClearSelection();
+  list->ClearAndRebuildList();
+  EXPECT_TRUE(list->GetSelectedItems().IsEmpty());
+}
+
+TEST_F(ListViewTest, DumpListsEveryRowInDisplayOrderWithItsPath) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Timecode)});
+  Open();
+  Select({clip});
+  const std::vector<StateDumpRow> rows = list->GetDumpRows();
+  ASSERT_GE(rows.size(), 4u);
+  EXPECT_EQ(rows[0].path, (Strings{"Timecode"}));
+  EXPECT_EQ(rows[0].className, "FilterItem");
+  EXPECT_TRUE(rows[0].expanded);
+  EXPECT_TRUE(rows[0].shown);
+  EXPECT_EQ(rows[1].path, (Strings{"Timecode", "Position and Size"}));
+  EXPECT_EQ(rows[2].path, (Strings{"Timecode", "Position and Size", "Position"}));
+  EXPECT_EQ(rows[2].groupLevel, 1);
+  EXPECT_EQ(rows[1].top, rows[0].top + EffectItem::kFolderTitleHeight);
+  for (std::size_t i = 1; i < rows.size(); ++i) {
+    if (rows[i].shown && rows[i - 1].shown) {
+      EXPECT_GT(rows[i].top, rows[i - 1].top) << i;
+    }
+  }
+}
+
+TEST_F(ListViewTest, SelectionOfLinkedClipShowsVideoAndAudioAndSameSelectionDoesNotRebuild) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity)});
+  const TrackItemRef sound = AddClip(a1, {Make(kMatchName_Volume)});
+  clip->SetLinkGroup(7);
+  sound->SetLinkGroup(7);
+  Open();
+  Select({clip});
+  EXPECT_TRUE(list->GetShowVideo());
+  EXPECT_TRUE(list->GetShowAudio());
+  const std::shared_ptr<EffectItem> row = list->GetVideoItems().At(0);
+  list->DoSequenceClipSelectionChanged(sequence);
+  EXPECT_FALSE(row->IsDestroyed());
+
+  Select({});
+  EXPECT_TRUE(list->GetVideoItems().IsEmpty());
+  EXPECT_TRUE(list->GetAudioParts().empty());
+}
+
+}  // namespace
