@@ -100,11 +100,12 @@ EffectControlsView::EffectControlsView(Commander* parent, std::string contextNam
   });
   mRuler->SetTimeCallback([this](TickTime time, bool /*final*/) { SetEditTime(time); });
   mScrollBar->SetPositionCallback([this](int position) {
-    mListView->OnVScroll(ScrollCode{}, position, kKeyModifierNone);
+    mListView->OnVScroll(ScrollCode::kThumbPosition, position, kKeyModifierNone);
     mKeyframeView->Invalidate();
   });
 
   AddListener(mStation, *this);
+  AddListener(mListView->GetKeyframeViewStation(), *this);
   AddListener(kSequenceActivationStation, *this);
   AddListener(kTrackItemActivationStation, *this);
   AddListener(kMasterClipActivationStation, *this);
@@ -989,6 +990,8 @@ void EffectControlsView::ListenToMessage(const Message& message) {
     mKeyframeView->Invalidate();
   } else if (const auto* moved = message.As<EffectControlsListSeparatorMoved>()) {
     OnSeparatorMoved(moved->point.x + mListView->GetBounds().left);
+  } else if (message.Is<EffectControlsRefreshKeyframesMessage>()) {
+    mKeyframeView->Invalidate();
   } else if (message.Is<EffectControlsFilterSelectionChangedMessage>()) {
     mKeyframeView->Invalidate();
   } else if (message.Is<MasterClipNameChangedMessage>() ||
