@@ -38,9 +38,10 @@ bool IsCurved(TemporalInterpolation mode);
 // Influence is the fraction of the half of a segment that a handle reaches: the control point of
 // the outgoing side lies at p + (r - p) * influence / 2. So the two handles of a segment never
 // cross and time always advances along the curve. The default puts the control point a third of
-// the way along the segment, where a straight line would have it.
-inline constexpr double kDefaultInfluence = 2.0 / 3.0;
-inline constexpr double kMinimumInfluence = 0.002;  // 0.1 % of a segment
+// the way along the segment, where a straight line would have it. KeyframeCurve keeps influences
+// to float precision (ample for a handle), so these constants are floats too.
+inline constexpr double kDefaultInfluence = 2.0f / 3.0f;
+inline constexpr double kMinimumInfluence = 0.002f;  // 0.1 % of a segment
 inline constexpr double kMaximumInfluence = 1.0;
 
 // One keyframe of one parameter; a plain value. KeyframeCurve keeps a list of them ordered by time

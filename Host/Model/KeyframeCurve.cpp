@@ -13,8 +13,6 @@ constexpr double kMaximumSpeed = 1e200;
 // An edit of keyframe k changes auto tangents at k +- 1, path lengths of segments k - 2 .. k + 1,
 // auto speeds at k +- 2 and segments k - 3 .. k + 2; refreshing k +- 4 covers them all.
 constexpr std::size_t kRefreshRadius = 4;
-// A sampler steps over at most this many keyframes before it falls back to a binary search.
-constexpr std::size_t kCursorSteps = 8;
 
 constexpr double kTicksPerSecondD = static_cast<double>(kTicksPerSecond);
 
@@ -117,8 +115,10 @@ void MakeContinuous(Keyframe& keyframe, const Keyframe* before) {
   }
 }
 
+// Influences are kept to float precision, the precision the segments hold them in.
 double ClampInfluence(double influence) {
-  return std::clamp(influence, kMinimumInfluence, kMaximumInfluence);
+  return std::clamp(static_cast<double>(static_cast<float>(influence)), kMinimumInfluence,
+                    kMaximumInfluence);
 }
 
 }  // namespace
@@ -342,6 +342,7 @@ void KeyframeCurve::Clear() {
   mKeys.clear();
   mTimes.clear();
   mSegments.clear();
+  mInverses.clear();
   mPathLengths.clear();
   mPaths.clear();
   Touch();
@@ -509,6 +510,7 @@ void KeyframeCurve::InsertKey(std::size_t index, const Keyframe& keyframe) {
   if (before == 0) {
     // The first keyframe sets the kind; nothing derived is left from an earlier kind.
     mSegments.clear();
+    mInverses.clear();
     mPathLengths.clear();
     mPaths.clear();
   } else {
@@ -532,6 +534,7 @@ void KeyframeCurve::EraseKey(std::size_t index) {
 void KeyframeCurve::InsertSlot(std::size_t segment) {
   const auto at = static_cast<std::ptrdiff_t>(segment);
   mSegments.insert(mSegments.begin() + at, CurveSegment{});
+  mInverses.insert(mInverses.begin() + at, CurveInverse{});
   const ParamValueKind kind = *Kind();
   if (IsPathKind(kind)) {
     mPathLengths.insert(mPathLengths.begin() + at, 0.0);
@@ -544,6 +547,7 @@ void KeyframeCurve::InsertSlot(std::size_t segment) {
 void KeyframeCurve::EraseSlot(std::size_t segment) {
   const auto at = static_cast<std::ptrdiff_t>(segment);
   mSegments.erase(mSegments.begin() + at);
+  mInverses.erase(mInverses.begin() + at);
   if (!mPathLengths.empty()) {
     mPathLengths.erase(mPathLengths.begin() + at);
   }
@@ -559,6 +563,7 @@ void KeyframeCurve::RebuildAll() {
   const std::size_t segments = mKeys.size() < 2 ? 0 : mKeys.size() - 1;
   const std::optional<ParamValueKind> kind = Kind();
   mSegments.assign(segments, CurveSegment{});
+  mInverses.assign(segments, CurveInverse{});
   mPathLengths.assign(kind && IsPathKind(*kind) ? segments : 0, 0.0);
   mPaths.assign(kind == ParamValueKind::Point ? segments : 0, CurvePath{});
   if (!mKeys.empty()) {
@@ -716,7 +721,7 @@ void KeyframeCurve::RefreshSegment(std::size_t segment) {
   const double y0 = path ? 0.0 : ScalarOf(from.value);
   const double y3 = path ? mPathLengths[segment] : ScalarOf(to.value);
   if (from.interpolation == TemporalInterpolation::Hold || !Interpolates(kind)) {
-    g.MakeHold(from.time, to.time, y0, y3);
+    g.MakeHold(from.time, to.time, y0);
     return;
   }
   const bool straightOut = from.interpolation == TemporalInterpolation::Linear;
@@ -728,16 +733,16 @@ void KeyframeCurve::RefreshSegment(std::size_t segment) {
   }
   // The inner control points are the handles (ComputeHandle), in exact rather than whole ticks.
   const double span = static_cast<double>(to.time - from.time);
-  const double x1 = ClampInfluence(from.outInfluence) * 0.5;
-  const double x2 = 1.0 - ClampInfluence(to.inInfluence) * 0.5;
-  double y1 = y0 + Seconds(span * x1) * from.outSpeed;
-  double y2 = y3 - Seconds(span * (1.0 - x2)) * to.inSpeed;
+  const auto outReach = static_cast<float>(ClampInfluence(from.outInfluence) * 0.5);
+  const auto inReach = static_cast<float>(ClampInfluence(to.inInfluence) * 0.5);
+  double y1 = y0 + Seconds(span * outReach) * from.outSpeed;
+  double y2 = y3 - Seconds(span * inReach) * to.inSpeed;
   if (path) {
     // Inside [0, length] the distance neither runs back along the path nor beyond its ends.
     y1 = std::clamp(y1, 0.0, y3);
     y2 = std::clamp(y2, 0.0, y3);
   }
-  g.MakeBezier(from.time, to.time, y0, y1, y2, y3, x1, x2);
+  g.MakeBezier(from.time, to.time, y0, y1, y2, y3, outReach, inReach, mInverses[segment]);
 }
 
 // ---------------------------------------------------------------------------------------------
@@ -759,17 +764,18 @@ ParamValue KeyframeCurve::SegmentValue(std::size_t segment, TickTime time) const
     return from.value;
   }
   const Keyframe& to = mKeys[segment + 1];
-  if (time >= g.End()) {
+  if (time >= mTimes[segment + 1]) {
     return to.value;
   }
-  const double y = g.YAt(time);
+  const double y = g.YAt(time, mInverses[segment]);
   if (KindOf(from.value) == ParamValueKind::Double) {
     return y;
   }
   if (g.IsCurvedPath()) {
     return mPaths[segment].PointAtDistance(y);
   }
-  const double f = g.Y3() > 0.0 ? std::clamp(y / g.Y3(), 0.0, 1.0) : 0.0;
+  const double length = mPathLengths[segment];
+  const double f = length > 0.0 ? std::clamp(y / length, 0.0, 1.0) : 0.0;
   return Blend(from.value, to.value, f);
 }
 
@@ -797,7 +803,8 @@ double KeyframeCurve::VelocityAt(TickTime time, Approach approach) const {
   if (segment < 0 || segment >= static_cast<std::ptrdiff_t>(mKeys.size()) - 1) {
     return 0.0;
   }
-  return mSegments[static_cast<std::size_t>(segment)].VelocityAt(time);
+  const auto k = static_cast<std::size_t>(segment);
+  return mSegments[k].VelocityAt(time, mInverses[k]);
 }
 
 std::vector<VelocitySample> KeyframeCurve::CreateVelocitySegment(TickTime from, TickTime to,
@@ -853,12 +860,12 @@ void KeyframeCurve::VelocityExtremes(TickTime from, TickTime to, double* minimum
     if (g.Start() >= to) {
       break;
     }
-    if (g.End() <= from) {
+    if (mTimes[s + 1] <= from) {
       continue;
     }
     double low = 0.0;
     double high = 0.0;
-    g.VelocityRange(from, to, &low, &high);
+    g.VelocityRange(from, to, mInverses[s], &low, &high);
     include(low);
     include(high);
   }
@@ -986,11 +993,11 @@ std::optional<ParamValue> KeyframeCurve::Sampler::ValueAt(TickTime time) {
   return curve.SegmentValue(static_cast<std::size_t>(segment), time);
 }
 
-std::optional<double> KeyframeCurve::Sampler::ScalarAt(TickTime time) {
+std::optional<double> KeyframeCurve::Sampler::ScalarAtSlowly(TickTime time) {
   const KeyframeCurve& curve = *mCurve;
   const std::ptrdiff_t segment = Locate(time, Approach::FromRight);
   if (!mScalarSegments) {
-    return std::nullopt;
+    return std::nullopt;  // empty, or points, colours, text or blobs
   }
   if (segment < 0) {
     return AsScalar(curve.mKeys.front().value);
@@ -999,7 +1006,8 @@ std::optional<double> KeyframeCurve::Sampler::ScalarAt(TickTime time) {
     return AsScalar(curve.mKeys.back().value);
   }
   // Segments hold the scalar readings of their ends, so no value is unpacked here.
-  return curve.mSegments[static_cast<std::size_t>(segment)].YAt(time);
+  const auto k = static_cast<std::size_t>(segment);
+  return curve.mSegments[k].YAt(time, curve.mInverses[k]);
 }
 
 double KeyframeCurve::Sampler::VelocityAt(TickTime time, Approach approach) {
@@ -1008,5 +1016,6 @@ double KeyframeCurve::Sampler::VelocityAt(TickTime time, Approach approach) {
   if (segment < 0 || segment >= static_cast<std::ptrdiff_t>(curve.mKeys.size()) - 1) {
     return 0.0;
   }
-  return curve.mSegments[static_cast<std::size_t>(segment)].VelocityAt(time);
+  const auto k = static_cast<std::size_t>(segment);
+  return curve.mSegments[k].VelocityAt(time, curve.mInverses[k]);
 }

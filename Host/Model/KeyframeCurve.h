@@ -42,8 +42,8 @@ enum class Approach : std::uint8_t { FromLeft, FromRight };
 // The keyframes of one parameter, ordered by time, no two at the same time, all of one value kind
 // (the kind of the first keyframe added; an empty curve takes any). A plain value: copies are
 // independent; no messages, no undo (callers wrap edits in actions). Every edit either succeeds
-// or changes nothing and says why. Edits cost O(n) for the vector shift and O(1) for refreshing
-// the derived speeds and segments around the edit.
+// or changes nothing and says why. An edit of one keyframe costs O(n) for the vector shift and
+// O(1) for refreshing the derived speeds and segments around it; MoveKeyframes rebuilds all.
 //
 // Evaluation: before the first keyframe the value is the first keyframe's, after the last the
 // last's; at a keyframe's time it is that keyframe's value. Between keyframes k and k + 1:
@@ -163,15 +163,18 @@ class KeyframeCurve {
   std::vector<Keyframe> mKeys;
   std::vector<TickTime> mTimes;         // mTimes[k] == mKeys[k].time, compact for searching
   std::vector<CurveSegment> mSegments;  // mSegments[k] joins mKeys[k] and mKeys[k + 1]
+  std::vector<CurveInverse> mInverses;  // beside mSegments, used by Bezier segments
   std::vector<double> mPathLengths;     // points and colours: length of segment k's path
   std::vector<CurvePath> mPaths;        // points: the path of segment k when it is curved
   std::uint64_t mRevision = 0;
 };
 
 // Evaluates a curve at many times, as a graph does pixel by pixel: remembers the segment of the
-// last answer, so times that rise (or fall) slowly cost amortised O(1) each, and a jump falls back
-// to a binary search. The curve must outlive the sampler; an edit of the curve is noticed (through
-// its revision) and the cursor starts over. Not thread-safe; one sampler per thread.
+// last answer, so a time in that segment or within the next few keyframes (either way) costs O(1)
+// and only a farther jump costs a binary search. Monotone sampling is thus O(1) per sample
+// whether keyframes are sparse or denser than the samples. The curve must outlive the sampler; an
+// edit of the curve is noticed (through its revision) and the cursor starts over. Not
+// thread-safe; one sampler per thread.
 class KeyframeCurve::Sampler {
  public:
   explicit Sampler(const KeyframeCurve& curve) : mCurve(&curve) {}
@@ -183,10 +186,42 @@ class KeyframeCurve::Sampler {
  private:
   // The segment for `time`, or -1 before the first keyframe, Size() - 1 at or after the last.
   std::ptrdiff_t Locate(TickTime time, Approach approach);
+  std::optional<double> ScalarAtSlowly(TickTime time);
   void Sync();
+
+  // A sampler steps over at most this many keyframes before it falls back to a binary search.
+  static constexpr std::size_t kCursorSteps = 4;
 
   const KeyframeCurve* mCurve;  // not owned; the caller keeps the curve alive
   std::uint64_t mRevision = ~std::uint64_t{0};
   std::size_t mSegment = 0;
   bool mScalarSegments = false;  // the curve's segments hold scalar values (not path distances)
 };
+
+// Inline so that a graph's sampling loop runs without calls in the common case: the time lies in
+// the cursor's segment or one of the next few.
+inline std::optional<double> KeyframeCurve::Sampler::ScalarAt(TickTime time) {
+  const KeyframeCurve& curve = *mCurve;
+  if (mRevision == curve.mRevision && mScalarSegments) {
+    const std::size_t count = curve.mSegments.size();
+    const TickTime* times = curve.mTimes.data();
+    const std::size_t k = mSegment;
+    if (k < count && times[k] <= time) {
+      if (time < times[k + 1]) {
+        return curve.mSegments[k].YInside(time, curve.mInverses[k]);
+      }
+      if (k + kCursorSteps <= count) {
+        // Count the keyframes passed without branching, so irregular strides cost nothing.
+        std::size_t j = k;
+        for (std::size_t i = 1; i <= kCursorSteps; ++i) {
+          j += times[k + i] <= time ? 1 : 0;
+        }
+        if (j < k + kCursorSteps) {
+          mSegment = j;
+          return curve.mSegments[j].YInside(time, curve.mInverses[j]);
+        }
+      }
+    }
+  }
+  return ScalarAtSlowly(time);
+}

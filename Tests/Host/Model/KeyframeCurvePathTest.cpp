@@ -154,7 +154,7 @@ TEST(KeyframeCurvePath, HandlesOfPathsCarryTheSpeed) {
   const std::optional<KeyframeHandle> handle = curve.ComputeHandle(0, KeyframeSide::Out);
   ASSERT_TRUE(handle);
   EXPECT_DOUBLE_EQ(handle->value, 5.0);
-  EXPECT_EQ(handle->time, kSecond / 3);
+  EXPECT_NEAR(static_cast<double>(handle->time), kSecond / 3.0, 1e-6 * kSecond);  // a third
 }
 
 TEST(KeyframeCurvePath, IncrementalRefreshEqualsAFreshBuild) {
