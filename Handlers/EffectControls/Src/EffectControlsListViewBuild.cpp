@@ -173,7 +173,8 @@ void EffectControlsListView::UpdateParamsUI(TickTime editTime, bool force) {
 // --- Video clip ---
 
 void EffectControlsListView::RebuildVideoClipView(const TrackItemGroup* inTrackItemGroup) {
-  if (!HOST_VERIFY(inTrackItemGroup != NULL, "Invalid inTrackItemGroup")) {
+  HOST_ASSERT(inTrackItemGroup != NULL, "Invalid inTrackItemGroup");
+  if (inTrackItemGroup == nullptr) {
     return;
   }
   if (inTrackItemGroup->videoItems.empty()) {
@@ -293,7 +294,8 @@ void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
 // --- Audio clip ---
 
 void EffectControlsListView::RebuildAudioClipView(const TrackItemGroup* inTrackItemGroup) {
-  if (!HOST_VERIFY(inTrackItemGroup != NULL, "Invalid inTrackItemGroup")) {
+  HOST_ASSERT(inTrackItemGroup != NULL, "Invalid inTrackItemGroup");
+  if (inTrackItemGroup == nullptr) {
     return;
   }
   if (HasECPStyle(kStyleNoAudio)) {
@@ -407,7 +409,8 @@ AudioPartInfo* EffectControlsListView::FindAudioPartInfo(const EffectItem& row) 
 // --- Transitions ---
 
 void EffectControlsListView::RebuildTransitionView(const TrackItemGroup* inTrackItemGroup) {
-  if (!HOST_VERIFY(inTrackItemGroup != NULL, "Invalid inTrackItemGroup")) {
+  HOST_ASSERT(inTrackItemGroup != NULL, "Invalid inTrackItemGroup");
+  if (inTrackItemGroup == nullptr) {
     return;
   }
   if (mShowVideo) {
@@ -429,7 +432,8 @@ void EffectControlsListView::RebuildTransitionView(const TrackItemGroup* inTrack
 
 void EffectControlsListView::RebuildTransitionComponentView(
     const TrackItemGroup* inTrackItemGroup) {
-  if (!HOST_VERIFY(inTrackItemGroup != NULL, "Invalid inTrackItemGroup")) {
+  HOST_ASSERT(inTrackItemGroup != NULL, "Invalid inTrackItemGroup");
+  if (inTrackItemGroup == nullptr) {
     return;
   }
   mVideoExpanded = true;

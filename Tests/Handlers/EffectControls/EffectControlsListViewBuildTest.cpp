@@ -486,3 +486,80 @@ TEST_F(ListViewTest, SelectionOfLinkedClipShowsVideoAndAudioAndSameSelectionDoes
 }
 
 }  // namespace
+
+namespace {
+
+TEST_F(ListViewTest, StyleBitsReachTheEffectRowsOptions) {
+  list->SetStyle(kStyleCheckboxSwitch | kStyleIndentFilters | kStyleStartCollapsed |
+                 kStyleNoFilterIndent | kStyleFilterOption6);
+  EXPECT_TRUE(list->HasECPStyle(kStyleIndentFilters | kStyleNoAudio));
+  EXPECT_FALSE(list->HasECPStyle(kStyleNoAudio | kStyleNoMaskControls));
+  Select({AddClip(v1, {Make(kMatchName_Opacity)})});
+  const FilterItemOptions& options = Filter(list->GetVideoItems(), 0).GetOptions();
+  EXPECT_TRUE(options.topLevel);
+  EXPECT_TRUE(options.checkboxSwitch);
+  EXPECT_TRUE(options.option6);
+  EXPECT_EQ(options.indent, 40);
+  EXPECT_TRUE(options.startCollapsed);
+  EXPECT_TRUE(options.noIndent);
+
+  list->SetStyle(kStyleNone);
+  list->ClearAndRebuildList();
+  const FilterItemOptions& plain = Filter(list->GetVideoItems(), 0).GetOptions();
+  EXPECT_FALSE(plain.checkboxSwitch);
+  EXPECT_EQ(plain.indent, 0);
+  EXPECT_FALSE(plain.startCollapsed);
+  EXPECT_FALSE(plain.noIndent);
+}
+
+TEST_F(ListViewTest, NoAudioStyleLoadsNoPartsAndNoVideoExpanderStyleMakesNoButton) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity)});
+  const TrackItemRef sound = AddClip(a1, {Make(kMatchName_Volume)});
+  clip->SetLinkGroup(6);
+  sound->SetLinkGroup(6);
+  list->SetStyle(kStyleNoAudio | kStyleNoVideoExpander);
+  Open();
+  Select({clip});
+  EXPECT_EQ(list->GetVideoExpander(), nullptr);
+  EXPECT_NE(list->GetGraphicsExpander(), nullptr);
+  EXPECT_EQ(Titles(list->GetVideoItems()), (Strings{"Opacity"}));
+  EXPECT_TRUE(list->GetAudioParts().empty());
+  // The section keeps its header without a button.
+  EXPECT_EQ(list->GetVideoItems().At(0)->GetTop(), EffectControlsListView::kSectionHeaderHeight);
+}
+
+TEST_F(ListViewTest, GroupEndClosesTheCountedGroupsInsideItsGroup) {
+  ComponentRef effect = Component::Create("XO.KRVN Nest", "Nest", MediaType::Video, false);
+  effect->AddParam(ComponentParam::Create("Outer", ParamType::GroupBegin, false));
+  effect->AddParam(ComponentParam::Create("Counted", ParamType::GroupBegin, WideText("a;b;c;"))
+                       ->SetGroupKind(GroupKind::Counted));
+  effect->AddParam(ComponentParam::Create("One", ParamType::FloatSlider, 1.0));
+  effect->AddParam(ComponentParam::Create("", ParamType::GroupEnd, false));
+  effect->AddParam(ComponentParam::Create("After", ParamType::FloatSlider, 1.0));
+  Select({AddClip(v1, {effect})});
+  const EffectItem& row = *list->GetVideoItems().At(0);
+  ASSERT_EQ(ChildTitles(row), (Strings{"Outer", "After"}));
+  const EffectItem& outer = *row.GetItems()[0];
+  ASSERT_EQ(ChildTitles(outer), (Strings{"Counted"}));
+  EXPECT_EQ(ChildTitles(*outer.GetItems()[0]), (Strings{"One"}));
+  EXPECT_EQ(outer.GetItems()[0]->GetGroupLevel(), 1);
+  EXPECT_EQ(outer.GetItems()[0]->GetItems()[0]->GetGroupLevel(), 2);
+}
+
+TEST_F(ListViewTest, FindsTheAudioPartOfARowAtAnyDepth) {
+  const TrackItemRef first = AddClip(a1, {Make(kMatchName_Volume)});
+  const TrackItemRef second = AddClip(a2, {Make(kMatchName_Delay)});
+  first->SetLinkGroup(8);
+  second->SetLinkGroup(8);
+  second->SetPartOrderKey(1);
+  Select({first});
+  ASSERT_EQ(list->GetNumberOfAudioParts(), 2);
+  const EffectItem& delay = *list->GetAudioParts()[1]->GetItems().At(0);
+  EXPECT_EQ(list->FindAudioPartInfo(delay), list->GetAudioParts()[1].get());
+  EXPECT_EQ(list->FindAudioPartInfo(*delay.GetItems().back()), list->GetAudioParts()[1].get());
+  EXPECT_EQ(list->FindAudioPartInfoByIndex(2), nullptr);
+  EffectItem stranger(nullptr, "Stranger", {});
+  EXPECT_EQ(list->FindAudioPartInfo(stranger), nullptr);
+}
+
+}  // namespace
