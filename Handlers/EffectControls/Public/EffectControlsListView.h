@@ -138,8 +138,9 @@ class EffectControlsListView : public SubView, public Listener {
   // ClearList, a fresh build for the target, then the list-changed and keyframe-refresh
   // messages.
   void ClearAndRebuildList();
-  // Destroys every row and button the build made and forgets the target's objects; the
-  // selections are emptied. The sequence, master clip and style stay.
+  // Destroys every row and button the build made and forgets the objects it showed; the
+  // selections are emptied. What the next build shows stays: the sequence, the master clip, the
+  // style and the target the selection chose (kind, shown halves, transition chain).
   virtual void ClearList();
   virtual void RebuildClipOrTransitionView();
   void RebuildVideoClipView(const TrackItemGroup* group);

@@ -104,6 +104,7 @@ void EffectControlsListView::ClearList() {
   mVideoChain.reset();
   mMasterGraphicChain.reset();
   mAudioTransitionItem.reset();
+  // The transition chain is what the selection chose to show; the rebuild that follows needs it.
   mKeyframeSelection.reset();
   mTextExpanded = false;
   if (mTextExpander) {
