@@ -66,13 +66,15 @@ class EffectControlsHandler : public Handler, public Listener {
   void ListenToMessage(const Message& message) override;
 
   int GetToolMode() const { return mToolMode; }
-  // The panel's view, or null before the host asked for it.
-  EffectControlsView* GetView() const { return mView.get(); }
+  // The panel's view; null before the host asked for it and after its tab was destroyed.
+  EffectControlsView* GetView() const;
   // The images every keyframe track draws from (also handed to the rows).
   const std::shared_ptr<const ImageList>& GetKeyframeImageList() const { return mKeyframeImages; }
 
  private:
   void SetToolMode(int mode);
+  // Drops a view whose tab the host destroyed (a closed tab).
+  void ForgetDestroyedView();
 
   int mToolMode = kToolModePointer;
   std::shared_ptr<EffectControlsView> mView;  // shared with the workspace frame
