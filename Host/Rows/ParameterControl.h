@@ -130,8 +130,9 @@ class ParameterControl : public EffectItem, public Commander {
   // The row accepts no edits: the container or the parameter is read only.
   bool IsReadOnly() const;
   void SetReadOnly(bool readOnly) { mReadOnly = readOnly; }
-  // The number a group control reports this row's parameter under.
-  void SetControlID(int id) { mControlID = id; }
+  // The number a group control reports this row's parameter under; rows pass it on to their
+  // controls as the owner cookie.
+  virtual void SetControlID(int id) { mControlID = id; }
   int GetControlID() const { return mControlID; }
 
   // --- Time ---
