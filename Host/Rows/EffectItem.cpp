@@ -198,6 +198,11 @@ void EffectItem::PositionSelf(int top, int depth, int width) {
   PositionChildren(top + OwnHeight() + (mExpanded ? GetExpandedAreaHeight() : 0), depth + 1, width);
 }
 
+void EffectItem::PositionSelfUsingHostSize(int top, int depth) {
+  const ViewBase* parent = GetParentView();
+  PositionSelf(top, depth, parent != nullptr ? parent->GetBounds().Width() : mWidth);
+}
+
 int EffectItem::Height() const {
   return OwnHeight() + (mExpanded ? GetExpandedAreaHeight() + ChildrenHeight() : 0);
 }

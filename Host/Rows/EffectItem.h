@@ -156,6 +156,8 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   // its own depth + 1). The base places the triangle and lays the visible children out under
   // the row's own band.
   virtual void PositionSelf(int top, int depth, int width);
+  // PositionSelf across the parent view's width (rows that size themselves to the view).
+  virtual void PositionSelfUsingHostSize(int top, int depth);
   // The row's own band plus, while expanded, its expanded area and the heights of its children
   // that are not set aside. A set-aside row still answers its height; callers skip it.
   virtual int Height() const;

@@ -30,9 +30,10 @@ void FloatSliderParameter::SynchToCurrentTime() {
     if (GetSlider() && GetSlider()->GetValue() != static_cast<float>(value)) {
       GetSlider()->SetValue(static_cast<float>(value));
     }
-    return;
+  } else {
+    ShowValue(value);
   }
-  ShowValue(value);
+  UpdateCurrentVelocity();
 }
 
 void FloatSliderParameter::RefreshSliderParameters() {

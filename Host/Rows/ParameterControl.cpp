@@ -280,6 +280,12 @@ void ParameterControl::RedrawKeyframeView() {
   }
 }
 
+void ParameterControl::UpdateCurrentVelocity() {
+  mCurrentVelocity = mParam && mParam->IsTimeVarying()
+                         ? mParam->GetKeyframes().VelocityAt(GetClipEditTime())
+                         : 0.0;
+}
+
 bool ParameterControl::SynchParamActor() {
   if (mActor) {
     return true;
@@ -388,6 +394,24 @@ int ParameterControl::GetKeyframeImageIndex(const ComponentParam& param, std::si
     return 0;
   }
   const std::size_t count = curve.Size();
+  if (param.GetType() == ParamType::TimeRemapping) {
+    // Speed keyframes: halves at the ends (left half for the last, right half for the first),
+    // with their own pictures for holds.
+    const bool hold = curve.At(keyframeIndex).interpolation == TemporalInterpolation::Hold;
+    const bool first = count > 1 && keyframeIndex == 0;
+    const bool last = count > 1 && keyframeIndex == count - 1;
+    int base = kEffectControlsKeyTRDualControlPointNormalDecal;
+    if (hold) {
+      base = first  ? kEffectControlsKeyTRDualHoldRightNormalDecal
+             : last ? kEffectControlsKeyTRDualHoldLeftNormalDecal
+                    : kEffectControlsKeyTRHoldControlPointNormalDecal;
+    } else if (first) {
+      base = kEffectControlsKeyTRRightControlPointNormalDecal;
+    } else if (last) {
+      base = kEffectControlsKeyTRLeftControlPointNormalDecal;
+    }
+    return base - kFirstKeyframeDecal + (selected ? 1 : 0);
+  }
   int variant = 0;
   if (count > 1 && keyframeIndex == 0) {
     variant = 1;  // nothing before it: the glyph's right half

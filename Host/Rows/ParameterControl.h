@@ -160,6 +160,9 @@ class ParameterControl : public EffectItem, public Commander {
   virtual void OnPlayerIsStopped();
   // Tells the list that a change ended, so the keyframe area is redrawn.
   void RedrawKeyframeView();
+  // Re-reads the rate of change at the edit time (value units per second; 0 when constant).
+  void UpdateCurrentVelocity();
+  double GetCurrentVelocity() const { return mCurrentVelocity; }
 
   // --- Edit contract ---
   virtual bool SynchParamActor();
@@ -267,6 +270,7 @@ class ParameterControl : public EffectItem, public Commander {
   StationName mPlayerStation;
   std::shared_ptr<const TickTime> mEditTime;
   std::optional<TickTime> mLastSynchTime;
+  double mCurrentVelocity = 0.0;
   bool mReadOnly = false;
   int mControlID = 0;
   bool mListening = false;

@@ -34,7 +34,8 @@ void SliderParameter::PositionSelf(int top, int depth, int width) {
   ParameterControl::PositionSelf(top, depth, width);
   const int left = GetControlsLeft() + 10;
   if (mHotText) {
-    PlaceView(*mHotText, Rect::FromSize(left, top + 2, kHotTextWidth, kHotTextHeight));
+    PlaceView(*mHotText, Rect::FromSize(left, top + 2, kHotTextWidth + GetHotTextPaddingWidth(),
+                                        kHotTextHeight));
   }
   const int sliderTop = top + OwnHeight() + 4;
   const int sliderWidth = std::max(width - left - 12, 20);
@@ -68,6 +69,13 @@ void SliderParameter::SetControlID(int id) {
 
 void SliderParameter::SynchToCurrentTime() {
   ShowValue(ReadValue());
+  UpdateCurrentVelocity();
+}
+
+void SliderParameter::SynchToFeedback(const ComponentParamRef& param) {
+  if (param) {
+    ShowValue(AsScalar(param->GetValueAt(GetClipEditTime())).value_or(0.0));
+  }
 }
 
 void SliderParameter::RefreshSliderParameters() {

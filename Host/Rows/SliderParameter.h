@@ -43,6 +43,11 @@ class SliderParameter : public ParameterControl {
   // Reads range, digits, step, exponent and units from the parameter into the controls and
   // the labels, then shows the value.
   void RefreshSliderParameters() override;
+  // Shows the value of `param` at the edit time without binding to it (feedback of another
+  // parameter object); the next SynchToCurrentTime shows the row's own value again.
+  virtual void SynchToFeedback(const ComponentParamRef& param);
+  // Extra pixels the number field takes beyond its own width (a unit label).
+  virtual int GetHotTextPaddingWidth() const { return 0; }
 
   // --- From the controls ---
   virtual void OnHotFloatControlChanging(float value, std::int32_t cookie);

@@ -348,3 +348,43 @@ TEST_F(ParameterControlTest, RebindingMovesTheRowToAnotherParameter) {
 }
 
 }  // namespace
+
+namespace {
+
+class TimeRemappingGlyphTest : public RowsTest {};
+
+TEST_F(TimeRemappingGlyphTest, SpeedKeyframesUseTheirOwnPictures) {
+  auto speed = AddParam(ComponentParam::Create("Speed", ParamType::TimeRemapping, 1.0));
+  for (int i = 1; i <= 3; ++i) {
+    ComponentParamActions::AddKeyframe(speed, i * kSecond, 1.0);
+  }
+  EXPECT_EQ(ParameterControl::GetKeyframeImageIndex(*speed, 0, false), 40);  // right half
+  EXPECT_EQ(ParameterControl::GetKeyframeImageIndex(*speed, 1, true), 37);   // dual, selected
+  EXPECT_EQ(ParameterControl::GetKeyframeImageIndex(*speed, 2, false), 38);  // left half
+  ComponentParamActions::SetTemporalInterpolation(speed, 2 * kSecond, TemporalInterpolation::Hold);
+  EXPECT_EQ(ParameterControl::GetKeyframeImageIndex(*speed, 1, false), 42);
+  ComponentParamActions::SetTemporalInterpolation(speed, 1 * kSecond, TemporalInterpolation::Hold);
+  EXPECT_EQ(ParameterControl::GetKeyframeImageIndex(*speed, 0, true), 45);
+}
+
+TEST_F(TimeRemappingGlyphTest, TheVelocityAtTheEditTimeFollowsTheKeyframes) {
+  auto level = AddParam(ComponentParam::Create("Level", ParamType::FloatSlider, 0.0));
+  ComponentParamActions::AddKeyframe(level, 6 * kSecond, 0.0);
+  ComponentParamActions::AddKeyframe(level, 8 * kSecond, 10.0);
+  auto row = MakeRow<PlainRow>(level);
+  row->UpdateCurrentVelocity();  // clip 7 s, on a straight 5-per-second segment
+  EXPECT_DOUBLE_EQ(row->GetCurrentVelocity(), 5.0);
+  SetEditTime(15 * kSecond, *row);  // after the last keyframe
+  row->UpdateCurrentVelocity();
+  EXPECT_DOUBLE_EQ(row->GetCurrentVelocity(), 0.0);
+}
+
+TEST_F(TimeRemappingGlyphTest, ARowCanTakeItsWidthFromTheListView) {
+  auto level = AddParam(ComponentParam::Create("Level", ParamType::FloatSlider, 0.0));
+  auto row = MakeRow<PlainRow>(level);
+  row->PositionSelfUsingHostSize(33, 0);
+  EXPECT_EQ(row->GetTop(), 33);
+  EXPECT_EQ(row->GetWidth(), listView->GetBounds().Width());
+}
+
+}  // namespace

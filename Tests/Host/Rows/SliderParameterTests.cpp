@@ -268,3 +268,17 @@ TEST_F(DoubleSliderTest, AHandleTheLimiterDoesNotKnowIsNotClamped) {
 }
 
 }  // namespace
+
+namespace {
+
+TEST_F(SliderRowsTest, FeedbackShowsAnotherParametersValueUntilTheNextRefresh) {
+  auto other = ComponentParam::Create("Other", ParamType::FloatSlider, 25.0)->SetRange(0, 100);
+  auto row = MakeRow<FloatSliderParameter>(opacity, 0);
+  row->SynchToFeedback(other);
+  EXPECT_DOUBLE_EQ(row->GetHotText()->GetValue(), 25.0);
+  EXPECT_EQ(row->GetParam(), opacity);
+  row->SynchToCurrentTime();
+  EXPECT_DOUBLE_EQ(row->GetHotText()->GetValue(), 100.0);
+}
+
+}  // namespace
