@@ -2,6 +2,6 @@
 
 #include <string_view>
 
-// examples/demo.json as it was at build time; empty when the repository had none. Generated
+// examples/demo.json as it was at build time. Generated
 // into the build folder by EmbedFile.cmake.
 std::string_view EmbeddedDemoProjectJSON();

@@ -14,9 +14,9 @@
 #include "Apps/effectcontrols/EmbeddedDemoProject.h"
 #include "Host/Messaging/MessageLoop.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectFile.h"
 #include "Host/Shell/Application.h"
 #include "Host/Shell/AutomationScript.h"
-#include "Host/Shell/DemoProject.h"
 #include "Host/Shell/ProgramOptions.h"
 #include "Host/Shell/ScriptRunner.h"
 #include "Host/Shell/Sdl/SdlInputBox.h"
@@ -27,11 +27,6 @@
 #include "Host/Toolkit/InputBox.h"
 #include "Host/Toolkit/MenuTracker.h"
 #include "Host/Toolkit/ViewHost.h"
-
-// Project files: the model's reader and writer, once the build has them (CMakeLists.txt).
-#ifdef EC_HAVE_PROJECT_FILE
-#include "Host/Model/ProjectFile.h"
-#endif
 
 namespace {
 
@@ -54,49 +49,36 @@ void Settle(Application& application) {
   application.GetViewHost().Render();
 }
 
-// The built-in demo: examples/demo.json as embedded at build time, or, without a project file
-// reader or without that file, the same project made in code.
-ProjectRef OpenDemoProject([[maybe_unused]] std::string& error) {
-#ifdef EC_HAVE_PROJECT_FILE
-  if (!EmbeddedDemoProjectJSON().empty()) {
-    ProjectLoadResult loaded = ProjectFile::LoadFromString(EmbeddedDemoProjectJSON());
-    if (!loaded)
-      error = "the built-in demo project does not load: " + loaded.error;
-    return loaded.project;
-  }
-#endif
-  return BuildDemoProject();
+// The built-in demo: examples/demo.json as embedded at build time.
+ProjectRef OpenDemoProject(std::string& error) {
+  ProjectLoadResult loaded = ProjectFile::LoadFromString(EmbeddedDemoProjectJSON());
+  if (!loaded)
+    error = "the built-in demo project does not load: " + loaded.error;
+  return loaded.project;
 }
 
 ProjectRef OpenProjectFile(const std::string& path, std::string& error) {
-#ifdef EC_HAVE_PROJECT_FILE
   ProjectLoadResult loaded = ProjectFile::Load(path);
   if (!loaded)
     error = loaded.error.starts_with(path) ? loaded.error : path + ": " + loaded.error;
   return loaded.project;
-#else
-  error = "cannot open '" + path +
-          "': opening project files is not available yet (run without --project for the demo "
-          "project)";
-  return nullptr;
-#endif
 }
 
-void AllowSaving([[maybe_unused]] ScriptRunner& runner) {
-#ifdef EC_HAVE_PROJECT_FILE
+void AllowSaving(ScriptRunner& runner) {
   runner.SetProjectSaver([](const Project& project, const std::string& path, std::string* error) {
     return ProjectFile::Save(project, path, error);
   });
-#endif
 }
 
-int ReportRun(const ScriptRunResult& result) {
+// `scriptPath` names the script in a failure (empty for the program's own one-shot frame).
+int ReportRun(const ScriptRunResult& result, const std::string& scriptPath) {
   for (const auto& path : result.written)
     std::cout << "wrote " << path << "\n";
   for (const auto& warning : result.warnings)
     std::cerr << "effectcontrols: warning: " << warning << "\n";
   if (!result.ok)
-    return Fail(kExitScriptFailed, result.Describe());
+    return Fail(kExitScriptFailed,
+                scriptPath.empty() ? result.Describe() : scriptPath + ": " + result.Describe());
   return EXIT_SUCCESS;
 }
 
@@ -146,7 +128,7 @@ int Run(const ProgramOptions& options) {
       AllowSaving(runner);
       // Shots show what the window shows.
       runner.SetShotSource([&window] { return window->ReadBack(); });
-      exitCode = ReportRun(runner.Run(*script));
+      exitCode = ReportRun(runner.Run(*script), options.scriptPath);
     }
     window->RequestClose();
     while (window->Pump(0)) {
@@ -158,10 +140,10 @@ int Run(const ProgramOptions& options) {
   ScriptRunner runner(application, input, options.outDir);
   AllowSaving(runner);
   if (script)
-    return ReportRun(runner.Run(*script));
+    return ReportRun(runner.Run(*script), options.scriptPath);
   // Headless without a script: one frame of the workspace.
   const auto frame = AutomationScript::Parse("shot effectcontrols.png");
-  return ReportRun(runner.Run(std::get<AutomationScript>(frame)));
+  return ReportRun(runner.Run(std::get<AutomationScript>(frame)), {});
 }
 
 }  // namespace
