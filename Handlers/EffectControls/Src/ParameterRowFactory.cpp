@@ -12,10 +12,16 @@
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/TrackItem.h"
+#include "Host/Rows/AngleParameter.h"
 #include "Host/Rows/CheckboxParameter.h"
+#include "Host/Rows/DoubleSliderParameter.h"
 #include "Host/Rows/EffectItem.h"
+#include "Host/Rows/FloatSliderParameter.h"
 #include "Host/Rows/GroupBeginParameter.h"
 #include "Host/Rows/InfoParameter.h"
+#include "Host/Rows/LinkedPointPickerParameter.h"
+#include "Host/Rows/PointPickerParameter.h"
+#include "Host/Rows/SliderParameter.h"
 #include "Host/Rows/SpreadsheetParameter.h"
 #include "Host/Rows/TextParameter.h"
 
@@ -41,11 +47,32 @@ class StandInRow final : public HostRow, public StandInRowName {
         StandInRowName(std::string(meant) + " (host " + std::string(made) + ")") {}
 };
 
+// A row whose control does not exist yet and would show nothing but that control (mask
+// creation buttons, a custom audio interface): it keeps its place in the tree, takes no room and
+// cannot be selected.
+class EmptyStandInRow final : public EffectItem, public StandInRowName {
+ public:
+  EmptyStandInRow(std::string_view meant, ViewBase* parentView, const StationName& station)
+      : EffectItem(parentView, std::string(), station),
+        StandInRowName(std::string(meant) + " (host EffectItem)") {}
+
+  int OwnHeight() const override { return 0; }
+  bool IsSelectable() const override { return false; }
+  bool ShouldDrawDivider() const override { return false; }
+};
+
 // The host row that shows a parameter's value as text: what every value parameter falls back to
 // until its own row exists.
 std::shared_ptr<ParameterControl> ValueStandIn(std::string_view meant,
                                                const ParameterControlInfo& info) {
   return std::make_shared<StandInRow<InfoParameter>>(meant, "InfoParameter", info);
+}
+
+// The host row that edits the parameter the way the panel's own row will, standing in for it.
+template <class HostRow, class... Args>
+std::shared_ptr<ParameterControl> HostRowStandIn(std::string_view meant, std::string_view made,
+                                                 const ParameterControlInfo& info, Args&&... args) {
+  return std::make_shared<StandInRow<HostRow>>(meant, made, info, std::forward<Args>(args)...);
 }
 
 std::shared_ptr<GroupBeginParameter> GroupStandIn(std::string_view meant,
@@ -57,6 +84,11 @@ std::shared_ptr<EffectItem> ItemStandIn(std::string_view meant, ViewBase* parent
                                         std::string name, const StationName& station) {
   return std::make_shared<StandInRow<EffectItem>>(meant, "EffectItem", parentView, std::move(name),
                                                   station);
+}
+
+// A template's scale starts with its coordinates linked.
+bool IsTemplateScale(const ParameterControlInfo& info) {
+  return info.component && info.component->IsCapsule() && info.param->GetName() == "Scale";
 }
 
 bool IsChromil(const ComponentRef& component) {
@@ -88,14 +120,20 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
   std::vector<std::shared_ptr<ParameterControl>> rows;
   switch (info.param->GetType()) {
     case ParamType::Slider:
-      rows.push_back(ValueStandIn("SliderParameter", info));
+      rows.push_back(std::make_shared<SliderParameter>(info));
       break;
     case ParamType::FloatSlider:
-      rows.push_back(
-          ValueStandIn(video ? "VideoFloatSliderParameter" : "AudioFloatSliderParameter", info));
+      rows.push_back(HostRowStandIn<FloatSliderParameter>(
+          video ? "VideoFloatSliderParameter" : "AudioFloatSliderParameter", "FloatSliderParameter",
+          info));
       break;
     case ParamType::Angle:
-      rows.push_back(ValueStandIn(ownSliderRows ? "AngleSliderParameter" : "AngleParameter", info));
+      if (ownSliderRows) {
+        rows.push_back(
+            HostRowStandIn<AngleParameter>("AngleSliderParameter", "AngleParameter", info));
+      } else {
+        rows.push_back(std::make_shared<AngleParameter>(info));
+      }
       break;
     case ParamType::Checkbox:
       rows.push_back(std::make_shared<CheckboxParameter>(info));
@@ -110,9 +148,9 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
         rows.push_back(ValueStandIn("PointSliderParameter", info));
         rows.push_back(ValueStandIn("PointSliderParameter", info));
       } else if (info.component && info.component->IsCapsule()) {
-        rows.push_back(ValueStandIn("LinkedPointPickerParameter", info));
+        rows.push_back(std::make_shared<LinkedPointPickerParameter>(info, IsTemplateScale(info)));
       } else {
-        rows.push_back(ValueStandIn("PointPickerParameter", info));
+        rows.push_back(std::make_shared<PointPickerParameter>(info));
       }
       break;
     case ParamType::Menu:
@@ -120,7 +158,7 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
       break;
     case ParamType::DoubleSlider:
     case ParamType::TimeRemapping:
-      rows.push_back(ValueStandIn("DoubleSliderParameter", info));
+      rows.push_back(std::make_shared<DoubleSliderParameter>(info));
       break;
     case ParamType::Custom:
       rows.push_back(ValueStandIn(info.component && info.component->IsGraphicsComponent()
@@ -201,7 +239,7 @@ std::shared_ptr<EffectItem> ParameterRowFactory::CreateMaskShapeRow(ViewBase* pa
                                                                     const StationName& station,
                                                                     const ComponentRef& component) {
   HOST_ASSERT(component, "Invalid Component");
-  return ItemStandIn("MaskShapeControl", parentView, std::string(), station);
+  return std::make_shared<EmptyStandInRow>("MaskShapeControl", parentView, station);
 }
 
 std::shared_ptr<EffectItem> ParameterRowFactory::CreateCustomAudioFilterRow(
@@ -211,7 +249,7 @@ std::shared_ptr<EffectItem> ParameterRowFactory::CreateCustomAudioFilterRow(
   if (!HOST_VERIFY(component, "Invalid Component")) {
     return nullptr;
   }
-  return ItemStandIn("CustomAudioFilterItem", parentView, std::string(), station);
+  return std::make_shared<EmptyStandInRow>("CustomAudioFilterItem", parentView, station);
 }
 
 std::shared_ptr<EffectItem> ParameterRowFactory::CreateVideoTransitionRow(

@@ -16,7 +16,10 @@
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/TransitionData.h"
+#include "Host/Model/UndoStack.h"
+#include "Host/Rows/FloatSliderParameter.h"
 #include "Host/Rows/GroupBeginParameter.h"
+#include "Host/Rows/LinkedPointPickerParameter.h"
 #include "Host/Toolkit/SubView.h"
 #include "Host/Toolkit/ViewHost.h"
 
@@ -156,6 +159,45 @@ TEST_F(ParameterRowFactoryTest, ACapsulesPointIsLinked) {
             Names{"LinkedPointPickerParameter"});
 }
 
+TEST_F(ParameterRowFactoryTest, OnlyATemplatesScaleStartsLinked) {
+  video->SetRole(ComponentRole::Capsule);
+  ParameterRowRequest scale = Request(video, ParamType::Point, ParamPoint{100, 100});
+  scale.info.param = ComponentParam::Create("Scale", ParamType::Point, ParamPoint{100, 100});
+  video->AddParam(scale.info.param);
+  const auto scaleRows = ParameterRowFactory::CreateParameterRows(scale);
+  const auto positionRows =
+      ParameterRowFactory::CreateParameterRows(Request(video, ParamType::Point, ParamPoint{1, 2}));
+  ASSERT_EQ(scaleRows.size(), 1u);
+  ASSERT_EQ(positionRows.size(), 1u);
+  made.push_back(scaleRows[0]);
+  made.push_back(positionRows[0]);
+  const auto* linkedScale = dynamic_cast<LinkedPointPickerParameter*>(scaleRows[0].get());
+  const auto* linkedPosition = dynamic_cast<LinkedPointPickerParameter*>(positionRows[0].get());
+  ASSERT_NE(linkedScale, nullptr);
+  ASSERT_NE(linkedPosition, nullptr);
+  EXPECT_TRUE(linkedScale->IsTemplateScale());
+  EXPECT_FALSE(linkedPosition->IsTemplateScale());
+}
+
+// Until the panel's own rows exist, numbers are edited by the host's rows: a typed value is one
+// undoable step.
+TEST_F(ParameterRowFactoryTest, AScalarRowEditsItsParameterAsOneUndoableStep) {
+  ParameterRowRequest request = Request(video, ParamType::FloatSlider, 10.0);
+  request.info.param->SetRange(0, 100);
+  const auto rows = ParameterRowFactory::CreateParameterRows(request);
+  ASSERT_EQ(rows.size(), 1u);
+  made.push_back(rows[0]);
+  auto* slider = dynamic_cast<FloatSliderParameter*>(rows[0].get());
+  ASSERT_NE(slider, nullptr);
+  slider->FinishCreateSelf();
+  const std::size_t steps = project->GetUndoStack().GetUndoNames().size();
+  slider->OnHotFloatControlChanged(42.0f, 0);
+  EXPECT_DOUBLE_EQ(request.info.param->GetScalarAt(0).value_or(-1), 42.0);
+  EXPECT_EQ(project->GetUndoStack().GetUndoNames().size(), steps + 1);
+  ASSERT_TRUE(project->GetUndoStack().Undo());
+  EXPECT_DOUBLE_EQ(request.info.param->GetScalarAt(0).value_or(-1), 10.0);
+}
+
 TEST_F(ParameterRowFactoryTest, AGraphicsLayersCustomParameterIsAGraphicsRow) {
   video->SetRole(ComponentRole::Graphics);
   EXPECT_EQ(Rows(Request(video, ParamType::Custom)), Names{"GraphicsParameter"});
@@ -251,6 +293,21 @@ TEST_F(ParameterRowFactoryTest, TheOtherRowsStandInForTheirClasses) {
       Meant(ParameterRowFactory::GetRowClassName(
           *ParameterRowFactory::CreateAudioTransitionRow(listView.get(), station, transition))),
       "AudioTransitionItem");
+}
+
+TEST_F(ParameterRowFactoryTest, ControlsStillToComeTakeNoRoomInTheList) {
+  auto maskShape =
+      ParameterRowFactory::CreateMaskShapeRow(listView.get(), "Test.EffectList", video);
+  auto custom = ParameterRowFactory::CreateCustomAudioFilterRow(listView.get(), "Test.EffectList",
+                                                                audio, true);
+  for (const auto& row : {maskShape, custom}) {
+    row->FinishCreateSelf();
+    row->Show();
+    row->PositionSelf(40, 0, 400);
+    EXPECT_EQ(row->Height(), 0);
+    EXPECT_FALSE(row->IsSelectable());
+    row->Destroy();
+  }
 }
 
 TEST_F(ParameterRowFactoryTest, AnEffectRowIsAFilterItem) {
