@@ -53,8 +53,15 @@ ComponentParamRef GroupEnd() {
   return ComponentParam::Create("", ParamType::GroupEnd, false);
 }
 
+// Wide text as the rows read it: UTF-16 code units, low byte first (the texts here are ASCII).
 ParamBlob TextBlob(std::string_view text) {
-  return ParamBlob{std::vector<std::uint8_t>(text.begin(), text.end())};
+  ParamBlob blob;
+  blob.bytes.reserve(text.size() * 2);
+  for (const char c : text) {
+    blob.bytes.push_back(static_cast<std::uint8_t>(c));
+    blob.bytes.push_back(0);
+  }
+  return blob;
 }
 
 ComponentRef Motion() {

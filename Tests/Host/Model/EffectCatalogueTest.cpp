@@ -65,8 +65,15 @@ TEST_F(EffectCatalogueTest, ACountedGroupListsTheParametersItSpans) {
   ASSERT_EQ(group->GetGroupKind(), GroupKind::Counted);
   ASSERT_EQ(group->GetValueKindCode(), kValueKindBinary);
   const ParamValue value = group->GetValueAt(0);
+  // Wide text, UTF-16 low byte first: "Smoothness;Settings;".
   const auto& bytes = std::get<ParamBlob>(value).bytes;
-  const auto spans = std::count(bytes.begin(), bytes.end(), ';');
+  ASSERT_EQ(bytes.size() % 2, 0u);
+  std::ptrdiff_t spans = 0;
+  for (std::size_t i = 0; i < bytes.size(); i += 2) {
+    EXPECT_EQ(bytes[i + 1], 0) << "code unit " << i / 2;
+    spans += bytes[i] == ';' ? 1 : 0;
+  }
+  ASSERT_EQ(spans, 2);
   const std::size_t first = grid->GetParamIndex(group.get());  // position + 1
   EXPECT_EQ(grid->GetParam(first)->GetName(), "Smoothness");
   EXPECT_EQ(grid->GetParam(first + static_cast<std::size_t>(spans) - 1)->GetName(), "Settings");
