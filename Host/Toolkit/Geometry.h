@@ -34,11 +34,19 @@ struct Rect {
 
   friend bool operator==(const Rect&, const Rect&) = default;
 
-  int Width() const { return right - left; }
-  int Height() const { return bottom - top; }
+  static int Saturate(std::int64_t value) {
+    return static_cast<int>(std::clamp<std::int64_t>(value, INT32_MIN, INT32_MAX));
+  }
+
+  // Extents wider than an int holds (a rect spanning far off-screen coordinates) saturate.
+  int Width() const { return Saturate(std::int64_t{right} - left); }
+  int Height() const { return Saturate(std::int64_t{bottom} - top); }
   Size GetSize() const { return {Width(), Height()}; }
   Point TopLeft() const { return {left, top}; }
-  Point Center() const { return {left + Width() / 2, top + Height() / 2}; }
+  Point Center() const {
+    return {static_cast<int>((std::int64_t{left} + right) / 2),
+            static_cast<int>((std::int64_t{top} + bottom) / 2)};
+  }
   bool IsEmpty() const { return right <= left || bottom <= top; }
 
   bool Contains(const Point& p) const {
@@ -57,8 +65,10 @@ struct Rect {
 
   // The smallest rect holding both; an empty operand is ignored.
   Rect Union(const Rect& other) const {
-    if (IsEmpty()) return other;
-    if (other.IsEmpty()) return *this;
+    if (IsEmpty())
+      return other;
+    if (other.IsEmpty())
+      return *this;
     return {std::min(left, other.left), std::min(top, other.top), std::max(right, other.right),
             std::max(bottom, other.bottom)};
   }
