@@ -136,7 +136,8 @@ class EffectControlsListView : public SubView, public Listener {
 
   // --- Building ---
   // ClearList, a fresh build for the target, then the list-changed and keyframe-refresh
-  // messages.
+  // messages. When the build throws (a model object it needs is missing), the list is left
+  // empty, announced as such, and the exception goes on to the caller's dispatch.
   void ClearAndRebuildList();
   // Destroys every row and button the build made and forgets the objects it showed; the
   // selections are emptied. What the next build shows stays: the sequence, the master clip, the

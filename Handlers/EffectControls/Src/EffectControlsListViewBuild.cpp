@@ -65,7 +65,19 @@ void EffectControlsListView::ClearAndRebuildList() {
   ClearList();
   if (mTargetKind == kTargetClip || mTargetKind == kTargetTransition ||
       mTargetKind == kTargetTransitionComponent) {
-    RebuildClipOrTransitionView();
+    try {
+      RebuildClipOrTransitionView();
+    } catch (...) {
+      // A model object the build needs was missing (the dispatch reports it). Half a list,
+      // unfinished and unplaced, must not stay on screen: show none and say so.
+      ClearList();
+      PositionItems();
+      UpdateVScrollBar();
+      BroadcastListChanged();
+      Invalidate();
+      BroadcastRefreshKeyframes();
+      throw;
+    }
   }
   mBuilt = true;
   UpdateVScrollBar();

@@ -563,3 +563,45 @@ TEST_F(ListViewTest, FindsTheAudioPartOfARowAtAnyDepth) {
 }
 
 }  // namespace
+
+namespace {
+
+// A list whose video build meets a missing model object after it made its rows.
+class FailingListView : public EffectControlsListView {
+ public:
+  using EffectControlsListView::EffectControlsListView;
+  void LoadVideoFilters(const TrackItemRef& trackItem, const ComponentChainRef& chain,
+                        bool masterClipMode) override {
+    EffectControlsListView::LoadVideoFilters(trackItem, chain, masterClipMode);
+    if (fail) {
+      made = GetVideoItems().Size() > 0 ? GetVideoItems().At(0) : nullptr;
+      throw NullInterfaceException("IComponentChain");
+    }
+  }
+  bool fail = true;
+  std::shared_ptr<EffectItem> made;
+};
+
+TEST_F(ListViewTest, ABuildThatThrowsLeavesAnEmptyAnnouncedListAndTheNextBuildWorks) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_Crop)});
+  auto failing = std::make_shared<FailingListView>(nullptr, "EffectControlsTest.Failing");
+  ListMessageRecorder own;
+  own.Listen(failing->GetOwnStation());
+  sequence->SetSelection({clip});
+
+  EXPECT_THROW(failing->DoSequenceClipSelectionChanged(sequence), NullInterfaceException);
+  ASSERT_NE(failing->made, nullptr);
+  EXPECT_TRUE(failing->made->IsDestroyed());
+  EXPECT_TRUE(failing->GetVideoItems().IsEmpty());
+  EXPECT_EQ(failing->GetVideoTrackItem(), nullptr);
+  EXPECT_EQ(failing->GetMaxHeight(), EffectControlsListView::kMaxHeightExtra);
+  EXPECT_EQ(own.Count("EffectControlsListChangedMessage"), 1);
+
+  // The same selection again is not taken for a list that is already built.
+  failing->fail = false;
+  failing->DoSequenceClipSelectionChanged(sequence);
+  EXPECT_EQ(Titles(failing->GetVideoItems()), (Strings{"Opacity", "Crop"}));
+  failing->Destroy();
+}
+
+}  // namespace
