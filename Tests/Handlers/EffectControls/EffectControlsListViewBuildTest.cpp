@@ -327,6 +327,21 @@ TEST_F(ListViewTest, CountedGroupSpansAsManyParametersAsItsValueHasSemicolons) {
   EXPECT_TRUE(emptyRow.GetItems()[0]->GetItems().empty());
 }
 
+TEST_F(ListViewTest, TheCataloguesCountedGroupHoldsTheParametersItNames) {
+  // Grid Distortion's "Advanced" group is counted: its text names Smoothness and Settings.
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_GridDistortion)});
+  Select({clip});
+  const EffectItem& row = *list->GetVideoItems().At(0);
+  const auto& children = row.GetItems();
+  const auto advanced = std::find_if(children.begin(), children.end(), [](const auto& child) {
+    return child->GetName() == "Advanced";
+  });
+  ASSERT_NE(advanced, children.end());
+  EXPECT_TRUE((*advanced)->IsGroupBegin());
+  EXPECT_EQ(ChildTitles(**advanced), (Strings{"Smoothness", "Settings"}));
+  EXPECT_EQ(advanced + 1, children.end());
+}
+
 TEST_F(ListViewTest, CountedGroupEndsEarlyWhenTheEffectRunsOutOfParameters) {
   ComponentRef effect = CountedGroupEffect("a;b;c;d;", {"Only"});
   // A stray group end closes nothing it should not.
