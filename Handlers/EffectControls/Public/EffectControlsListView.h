@@ -279,6 +279,9 @@ class EffectControlsListView : public SubView, public Listener {
 
   // --- Messages and commands ---
   void ListenToMessage(const Message& message) override;
+  // Switches every effect of the target (video, master-graphic and audio-part chains) on or
+  // off as one undoable step; nothing when the effects are read only.
+  void OnFilterOnOffAllChanged(bool enabled);
   bool FindCommandStatus(CommandID command, CommandStatus& status) override;
   bool ObeyCommand(CommandID command) override;
 

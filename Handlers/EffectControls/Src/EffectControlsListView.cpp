@@ -12,6 +12,7 @@
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Station.h"
+#include "Host/Model/ComponentChainActions.h"
 #include "Host/Model/EditPermissions.h"
 #include "Host/Model/KeyframeMultiSelection.h"
 #include "Host/Model/MasterClip.h"
@@ -296,6 +297,8 @@ void EffectControlsListView::ListenToMessage(const Message& message) {
     OnDisclosureStateAllChanged(all->expanded);
   } else if (message.Is<FilterItemNameChanged>()) {
     Invalidate();
+  } else if (const auto* onOff = message.As<FilterOnOffAllChanged>()) {
+    OnFilterOnOffAllChanged(onOff->enabled);
   } else if (const auto* added = message.As<EmbeddedEffectAdded>()) {
     // Remember where the pasted effect will be once the list is rebuilt.
     const EffectItemList& list = mVideoItems.IsEmpty() ? mGraphicsItems : mVideoItems;
@@ -344,6 +347,25 @@ void EffectControlsListView::ListenToMessage(const Message& message) {
   } else if (message.Is<ReadOnlyStateChangedMessage>()) {
     ClearAndRebuildList();
   }
+}
+
+void EffectControlsListView::OnFilterOnOffAllChanged(bool enabled) {
+  if (IsReadOnlyEffectContainer()) {
+    return;
+  }
+  std::vector<ComponentChainRef> chains;
+  for (const ComponentChainRef& chain : {mVideoChain, mMasterGraphicChain}) {
+    if (chain) {
+      chains.push_back(chain);
+    }
+  }
+  for (const auto& part : mAudioParts) {
+    if (part->IsClipPart() && part->GetTrackItem()->GetComponentChain()) {
+      chains.push_back(part->GetTrackItem()->GetComponentChain());
+    }
+  }
+  // One step for all of them; the rows follow through the components' change messages.
+  ComponentChainActions::SetBypass(chains, !enabled);
 }
 
 bool EffectControlsListView::FindCommandStatus(CommandID command, CommandStatus& status) {

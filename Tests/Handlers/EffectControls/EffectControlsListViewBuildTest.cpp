@@ -620,3 +620,47 @@ TEST_F(ListViewTest, ABuildThatThrowsLeavesAnEmptyAnnouncedListAndTheNextBuildWo
 }
 
 }  // namespace
+
+namespace {
+
+TEST_F(ListViewTest, AltToggleSwitchesEveryEffectOfTheTargetAsOneUndoStep) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_Crop)});
+  const TrackItemRef sound = AddClip(a1, {Make(kMatchName_Volume), Make(kMatchName_Delay)});
+  clip->SetLinkGroup(11);
+  sound->SetLinkGroup(11);
+  Open();
+  Select({clip});
+  auto everyEffect = [&] {
+    std::vector<ComponentRef> all = clip->GetComponentChain()->GetComponents();
+    const auto& audio = sound->GetComponentChain()->GetComponents();
+    all.insert(all.end(), audio.begin(), audio.end());
+    return all;
+  };
+  ASSERT_EQ(list->GetNumberOfAudioParts(), 1);
+  FilterItem& volumeRow = Filter(list->GetAudioParts()[0]->GetItems(), 0);
+
+  Filter(list->GetVideoItems(), 1).Toggle(kKeyModifierAlt);
+  for (const ComponentRef& component : everyEffect()) {
+    EXPECT_TRUE(component->IsBypassed()) << component->GetDisplayName();
+  }
+  EXPECT_EQ(project->GetUndoStack().GetUndoNames(),
+            (Strings{"MZ.ComponentChainActions.SetBypass"}));
+  EXPECT_FALSE(Filter(list->GetVideoItems(), 0).IsEnabled());
+  EXPECT_FALSE(volumeRow.IsEnabled());
+
+  ASSERT_TRUE(project->GetUndoStack().Undo());
+  for (const ComponentRef& component : everyEffect()) {
+    EXPECT_FALSE(component->IsBypassed()) << component->GetDisplayName();
+  }
+  EXPECT_TRUE(volumeRow.IsEnabled());
+
+  // Effects that cannot be edited stay as they are.
+  sequence->SetReadOnly(true);
+  list->OnFilterOnOffAllChanged(false);
+  for (const ComponentRef& component : everyEffect()) {
+    EXPECT_FALSE(component->IsBypassed()) << component->GetDisplayName();
+  }
+  EXPECT_TRUE(project->GetUndoStack().GetUndoNames().empty());
+}
+
+}  // namespace
