@@ -6,6 +6,10 @@
 
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/AudioPartInfo.h"
+#include "Handlers/EffectControls/Src/EffectControlsMessages.h"
+#include "Host/Messaging/Preferences.h"
+#include "Host/Messaging/PropertyList.h"
+#include "Host/Messaging/Station.h"
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/Keyframe.h"
 #include "Host/Model/KeyframeCurve.h"
@@ -14,6 +18,7 @@
 #include "Host/Rows/ParameterControl.h"
 #include "Host/Toolkit/Bitmap.h"
 #include "Host/Toolkit/ColorManager.h"
+#include "Host/Toolkit/Cursor.h"
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Decals.h"
 #include "Host/Toolkit/ImageList.h"
@@ -21,6 +26,19 @@
 namespace {
 
 constexpr double kTicksPerSecondD = 254016000000.0;
+
+struct SnapPreference {
+  unsigned flag;
+  std::string_view key;
+};
+constexpr SnapPreference kSnapPreferences[] = {
+    {EffectControlsKeyframeView::kSnapKeyframes, "effect.controls.is.keyframe.snapping"},
+    {EffectControlsKeyframeView::kSnapVideo, "effect.controls.issnapping.to.video"},
+    {EffectControlsKeyframeView::kSnapAudio, "effect.controls.issnapping.to.audio"},
+    {EffectControlsKeyframeView::kSnapMarkers, "effect.controls.is.snapping.to.sequence.markers"},
+    {EffectControlsKeyframeView::kSnapCurrentTime, "effect.controls.is.snapping.to.cti"},
+    {EffectControlsKeyframeView::kSnapClip, "effect.controls.is.snapping.to.clip"},
+};
 
 // The panel's colour when its set is registered, else the toolkit's.
 Color PanelColor(std::string_view key, std::string_view fallback) {
@@ -63,7 +81,33 @@ void VisitRows(const EffectItemList& list,
 }  // namespace
 
 EffectControlsKeyframeView::EffectControlsKeyframeView(Commander* superCommander)
-    : SubView(superCommander) {}
+    : SubView(superCommander) {
+  const PropertyList& properties = Preferences::Application().Properties();
+  mSnapFlags = 0;
+  for (const SnapPreference& preference : kSnapPreferences) {
+    if (properties.GetBool(preference.key, true)) {
+      mSnapFlags |= preference.flag;
+    }
+  }
+}
+
+void EffectControlsKeyframeView::SetSnapFlags(unsigned flags) {
+  PropertyList& properties = Preferences::Application().Properties();
+  unsigned stored = mSnapFlags;
+  for (const SnapPreference& preference : kSnapPreferences) {
+    const bool wanted = (flags & preference.flag) != 0;
+    if (wanted == ((mSnapFlags & preference.flag) != 0)) {
+      continue;
+    }
+    // A property the user may not change keeps the area's flag as it was.
+    if (properties.IsReadOnly(preference.key)) {
+      continue;
+    }
+    properties.SetBool(preference.key, wanted);
+    stored = wanted ? (stored | preference.flag) : (stored & ~preference.flag);
+  }
+  mSnapFlags = stored;
+}
 
 EffectControlsKeyframeView::~EffectControlsKeyframeView() = default;
 
@@ -201,4 +245,47 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
     dc.FillRect(Rect{x, 0, x + 1, bounds.Height()},
                 ColorManager::GetColor(kColor_CurrentTimeIndicator));
   }
+}
+
+// --- Separator ---
+
+void EffectControlsKeyframeView::ReportSeparator(Point point) const {
+  const auto list = mList.lock();
+  if (!list) {
+    return;
+  }
+  // Both views are children of the panel view: their bounds share its coordinates.
+  const int xInList = GetBounds().left + point.x - list->GetBounds().left;
+  BroadcastMessage(list->GetOwnStation(),
+                   EffectControlsListSeparatorMoved(Point{xInList, point.y}));
+}
+
+void EffectControlsKeyframeView::LeftButtonDownSelf(Point point, KeyModifiers /*modifiers*/) {
+  if (point.x < kSeparatorGrabWidth) {
+    mDraggingSeparator = true;
+    CaptureMouse();
+  }
+}
+
+void EffectControlsKeyframeView::MouseMoveSelf(Point point, KeyModifiers /*modifiers*/) {
+  if (mDraggingSeparator) {
+    ReportSeparator(point);
+  }
+}
+
+void EffectControlsKeyframeView::LeftButtonUpSelf(Point point, KeyModifiers /*modifiers*/) {
+  if (mDraggingSeparator) {
+    // The report moves this view: the last one comes from the release point.
+    mDraggingSeparator = false;
+    ReleaseMouse();
+    ReportSeparator(point);
+  }
+}
+
+bool EffectControlsKeyframeView::SetCursorSelf(Point point, KeyModifiers /*modifiers*/) {
+  if (mDraggingSeparator || point.x < kSeparatorGrabWidth) {
+    SetCurrentCursor(Cursor::kSplitterHorizontal);
+    return true;
+  }
+  return false;
 }

@@ -1,13 +1,23 @@
 #pragma once
 
 #include <memory>
+#include <string_view>
 
+#include "Host/Messaging/Message.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/TickTime.h"
 #include "Host/Toolkit/SubView.h"
 
 class EffectControlsListView;
 class ImageList;
+
+// The keyframe area asks the panel view to slide its visible time (a drag reached an edge).
+// `amount` in ticks, positive towards later times. Sent on the list's keyframe station.
+struct EffectControlsAutoScrollMessage : MessageOf<EffectControlsAutoScrollMessage> {
+  static constexpr std::string_view kTypeName = "EffectControlsAutoScrollMessage";
+  explicit EffectControlsAutoScrollMessage(TickTime a) : amount(a) {}
+  TickTime amount;
+};
 
 // The keyframe area beside the list: the targeted clip's span as a band, one track per visible
 // list row at the row's position, the keyframes of time-varying parameters and the current
@@ -36,7 +46,10 @@ class EffectControlsKeyframeView : public SubView {
   void SetEditTime(TickTime time);
   TickTime GetEditTime() const { return mEditTime; }
 
-  // Snapping flags (commands 18006 to 18013).
+  // Snapping flags: kSnapKeyframes switches snapping as a whole, the others pick what keyframe
+  // drags snap to. Read from the application properties at construction and written back on
+  // every change ("effect.controls.is.keyframe.snapping", "effect.controls.issnapping.to.video",
+  // ...); a read-only property keeps its value.
   enum SnapFlag : unsigned {
     kSnapKeyframes = 1,
     kSnapVideo = 2,
@@ -45,8 +58,12 @@ class EffectControlsKeyframeView : public SubView {
     kSnapCurrentTime = 16,
     kSnapClip = 32,
   };
-  void SetSnapFlags(unsigned flags) { mSnapFlags = flags; }
+  static constexpr unsigned kSnapTargets =
+      kSnapVideo | kSnapAudio | kSnapMarkers | kSnapCurrentTime | kSnapClip;
+  void SetSnapFlags(unsigned flags);
   unsigned GetSnapFlags() const { return mSnapFlags; }
+  bool IsSnapFlagSet(SnapFlag flag) const { return (mSnapFlags & flag) != 0; }
+  void ToggleSnapFlag(SnapFlag flag) { SetSnapFlags(mSnapFlags ^ flag); }
 
   // Time mapping from the list's time state: x in local pixels.
   TickTime GetVisibleStartTime() const;
@@ -57,9 +74,21 @@ class EffectControlsKeyframeView : public SubView {
   // Selected keyframes across the list's keyframe selection.
   int GetSelectedKeyframeCount() const;
 
+  // The area's left edge is the list/keyframe separator: pressing within kSeparatorGrabWidth of
+  // it and dragging reports EffectControlsListSeparatorMoved on the list's own station, with the
+  // pointer in the list's coordinates (the panel view moves the split).
+  static constexpr int kSeparatorGrabWidth = 4;
+  bool IsDraggingSeparator() const { return mDraggingSeparator; }
+
   void PaintSelf(DC& dc) override;
+  void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
+  void MouseMoveSelf(Point point, KeyModifiers modifiers) override;
+  void LeftButtonUpSelf(Point point, KeyModifiers modifiers) override;
+  bool SetCursorSelf(Point point, KeyModifiers modifiers) override;
 
  private:
+  void ReportSeparator(Point point) const;
+
   std::weak_ptr<EffectControlsListView> mList;
   std::shared_ptr<const ImageList> mImages;
   int mToolMode = 100;
@@ -68,6 +97,6 @@ class EffectControlsKeyframeView : public SubView {
   TickTime mClipStart = 0;
   TickTime mClipEnd = 0;
   TickTime mEditTime = 0;
-  unsigned mSnapFlags =
-      kSnapKeyframes | kSnapVideo | kSnapAudio | kSnapMarkers | kSnapCurrentTime | kSnapClip;
+  bool mDraggingSeparator = false;
+  unsigned mSnapFlags = kSnapKeyframes | kSnapTargets;
 };

@@ -12,6 +12,7 @@
 #include "Host/Model/TrackItem.h"
 #include "Host/Shell/Application.h"
 #include "Host/Toolkit/ColorManager.h"
+#include "Host/Toolkit/CommandStatus.h"
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Decals.h"
 #include "Host/Toolkit/Menu.h"
@@ -169,7 +170,9 @@ Rect EffectControlsListHeader::GetMasterZoneRect() const {
   const Rect text = GetTextRect();
   const int available = std::max(0, text.Width() - kUsesZoneWidth - kGroupGap);
   const int wanted = kTriangleWidth + mFont.StringWidth(GetMasterGroupText());
-  const int width = std::min(wanted, available / 2);
+  const int sequenceWanted = kTriangleWidth + mFont.StringWidth(GetSequenceGroupText());
+  // Each group gets at least half of the row; what one does not need, the other may use.
+  const int width = std::min(wanted, std::max(available / 2, available - sequenceWanted));
   return Rect{text.left, text.top, text.left + width, text.top + mFont.GetHeight()};
 }
 
@@ -339,6 +342,15 @@ void EffectControlsListHeader::PopUpUses() {
   MenuRegistry::Instance().Register(menu);
   TrackPopupMenu(kUsesMenuName, Point{GetUsesZoneRect().left, GetUsesZoneRect().bottom});
   MenuRegistry::Instance().Remove(kUsesMenuName);
+}
+
+bool EffectControlsListHeader::FindCommandStatus(CommandID command, CommandStatus& status) {
+  if (command >= kFirstUseCommand && command < kFirstUseCommand + kMaxUses) {
+    status = CommandStatus{};
+    status.enabled = static_cast<std::size_t>(command - kFirstUseCommand) < mUses.size();
+    return true;
+  }
+  return SubView::FindCommandStatus(command, status);
 }
 
 bool EffectControlsListHeader::ObeyCommand(CommandID command) {

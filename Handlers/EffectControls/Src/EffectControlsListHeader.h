@@ -82,7 +82,9 @@ class EffectControlsListHeader : public SubView {
   void SetBoundsSelf(const Rect& bounds) override;
   void PaintSelf(DC& dc) override;
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
-  // The uses popup's entries; other commands go up the chain.
+  // The uses popup's entries (enabled while the popup's uses exist); other commands go up the
+  // chain.
+  bool FindCommandStatus(CommandID command, CommandStatus& status) override;
   bool ObeyCommand(CommandID command) override;
 
  private:

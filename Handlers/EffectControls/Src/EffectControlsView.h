@@ -2,11 +2,14 @@
 
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "Handlers/EffectControls/Public/EffectControlsListScroller.h"
 #include "Handlers/EffectControls/Src/ECWZoomLimiter.h"
+#include "Handlers/EffectControls/Src/SequenceMarkers.h"
 #include "Host/Messaging/Listener.h"
+#include "Host/Messaging/Message.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/TickTime.h"
@@ -17,12 +20,24 @@
 class EffectControlsKeyframeView;
 class EffectControlsListHeader;
 class EffectControlsListView;
-class EffectControlsTimeRuler;
-class EffectControlsScrollBar;
 class HotTimecodeControl;
 class MultiPictureButton;
 class PictureButton;
+class ScrollBar;
 class SubView;
+class TimeBarControl;
+class ZoomBar;
+
+// While the panel plays an audio part, the sequence player's position (sequence ticks) and its
+// stop are relayed on the handler's "ECW.audio.player.relay" station.
+struct AudioPlayerPositionChangedMessage : MessageOf<AudioPlayerPositionChangedMessage> {
+  static constexpr std::string_view kTypeName = "AudioPlayerPositionChangedMessage";
+  explicit AudioPlayerPositionChangedMessage(TickTime t) : time(t) {}
+  TickTime time;
+};
+struct AudioPlayerIsStoppedMessage : MessageOf<AudioPlayerIsStoppedMessage> {
+  static constexpr std::string_view kTypeName = "AudioPlayerIsStoppedMessage";
+};
 
 // The panel's tab view: the header row, the effect list on the left, the keyframe area with its
 // time ruler on the right, a vertical scroll bar, the current-time field and the audio buttons.
@@ -46,18 +61,75 @@ class EffectControlsView : public TabView,
   static constexpr int kScrollStep = 20;
   static constexpr double kTicksPerSecond = 254016000000.0;
   static constexpr int kMaxScrollRange = 2147483646;
+  // The ruler: the toolkit's small time bar plus 4 px, with the zoom bar above it.
+  static constexpr int kZoomBarHeight = 10;
+  static constexpr int kRulerBarHeight = 24;
+  static constexpr int kRulerHeight = kZoomBarHeight + kRulerBarHeight;
 
   // Commands the view carries out itself.
   static constexpr int kRenameCommand = 18001;
   static constexpr int kSavePresetCommand = 18002;
+  static constexpr int kEffectsEnabledCommand = 18003;
+  static constexpr int kDeleteEffectCommand = 18005;
+  static constexpr int kToggleSnappingCommand = 18006;
+  static constexpr int kSnapToVideoCommand = 18007;
+  static constexpr int kSnapToAudioCommand = 18008;
+  static constexpr int kSnapToMarkersCommand = 18009;
+  static constexpr int kSnapToCurrentTimeCommand = 18010;
+  static constexpr int kSnapToClipCommand = 18011;
+  static constexpr int kSnapToAllCommand = 18012;
+  static constexpr int kSnapToNoneCommand = 18013;
   static constexpr int kToggleKeyframesCommand = 18015;
   static constexpr int kLoopAudioCommand = 18051;
   static constexpr int kAudioTimeUnitsCommand = 18052;
   static constexpr int kPinToClipCommand = 18053;
   static constexpr int kRulerNumbersCommand = 18054;
+  static constexpr int kResetEffectCommand = 18300;
   static constexpr int kPlayAudioCommand = 18550;
+  static constexpr int kDeleteAllEffectsCommand = 11541;
   static constexpr int kZoomInCommand = 12076;
   static constexpr int kZoomOutCommand = 12077;
+  // Host navigation and marker commands.
+  static constexpr int kMarkInCommand = 12065;
+  static constexpr int kMarkOutCommand = 12066;
+  static constexpr int kGoToInCommand = 12067;
+  static constexpr int kGoToOutCommand = 12068;
+  static constexpr int kClearInCommand = 12069;
+  static constexpr int kClearOutCommand = 12070;
+  static constexpr int kClearInOutCommand = 12071;
+  static constexpr int kAddMarkerCommand = 12072;
+  static constexpr int kClearMarkerCommand = 11730;
+  static constexpr int kClearAllMarkersCommand = 11731;
+  static constexpr int kNextMarkerCommand = 11732;
+  static constexpr int kPreviousMarkerCommand = 11733;
+  static constexpr int kEditMarkerCommand = 11793;
+  static constexpr int kFirstColoredMarkerCommand = 11830;
+  static constexpr int kLastColoredMarkerCommand = 11837;
+  static constexpr int kSequenceCommand11008 = 11008;
+  static constexpr int kKeyframeAreaCommand = 12100;
+  static constexpr int kBlendModeNormalCommand = 12200;
+  static constexpr int kBlendModeOtherCommand = 12201;
+  static constexpr int kFirstCapsuleResetCommand = 24020;
+  static constexpr int kLastCapsuleResetCommand = 24035;
+  static constexpr int kCapsuleResetAllCommand = 21823;
+
+  // The codes of master-clip navigation (what a navigation command does to a targeted master
+  // clip instead of the sequence).
+  enum MasterClipNavigation : int {
+    kNavMarkIn = 101,
+    kNavMarkOut = 102,
+    kNavGoToIn = 103,
+    kNavGoToOut = 104,
+    kNavClearIn = 105,
+    kNavClearOut = 106,
+    kNavClearInOut = 107,
+    kNavNextMarker = 109,
+    kNavPreviousMarker = 110,
+    kNavClearAllMarkers = 112,
+  };
+
+  // The menu the ruler shows on a right press.
+  static constexpr const char* kSequenceMarkerMenu = "HandlerEffectControls_Sequence_Marker_Menu";
 
   // `parent`: where unhandled commands go (the handler). `contextName`: the shortcut context
   // applied when the panel comes on duty.
@@ -95,8 +167,14 @@ class EffectControlsView : public TabView,
                                                   TrackItemRef& audio);
   int SequenceClipSelectionChangedForMultipleTrackItems(const std::vector<TrackItemGroup>& groups,
                                                         TrackItemRef& video, TrackItemRef& audio);
-  // Targets a master clip's own content (source clip selection).
+  // Targets a master clip's own content (match frame from the header, or a source clip);
+  // navigation commands then act on the master clip. Null is ignored.
   void TargetMasterClip(const MasterClipRef& masterClip);
+  const MasterClipRef& GetMasterClip() const { return mMasterClip; }
+  // Carries out a master-clip navigation code on the targeted master clip (its in and out
+  // points and markers are media times, mapped through the targeted clip). False when no
+  // master clip is targeted or nothing changed.
+  bool NavigateMasterClip(int code);
 
   // --- Layout state ---
   void OnSeparatorMoved(int listWidth);
@@ -121,7 +199,12 @@ class EffectControlsView : public TabView,
   double GetScrollScale() const { return mScrollScale; }
   const ECWZoomLimiter& GetZoomLimiter() const { return mZoomLimiter; }
   ECWZoomLimiter& GetZoomLimiter() { return mZoomLimiter; }
-  EffectControlsTimeRuler* GetTimeRuler() const { return mRuler.get(); }
+  TimeBarControl* GetTimeRuler() const { return mRuler.get(); }
+  ZoomBar* GetZoomBar() const { return mZoomBar.get(); }
+  ScrollBar* GetScrollBar() const { return mScrollBar.get(); }
+  const SequenceMarkers& GetMarkers() const { return mMarkers; }
+  // Scrolls the keyframe area's visible time by `ticks` (kept inside the limiter's range).
+  void ScrollVisibleTime(TickTime ticks);
   HotTimecodeControl* GetTimecodeControl() const { return mTimecode.get(); }
   MultiPictureButton* GetPlayAudioButton() const { return mPlayButton.get(); }
   PictureButton* GetLoopButton() const { return mLoopButton.get(); }
@@ -165,14 +248,38 @@ class EffectControlsView : public TabView,
   void StoreRatio(float ratio);
   void ApplyKeyframesVisible();
   void FollowSequence(const SequenceRef& sequence);
-  void FinishClipSelection(int state, int audioParts);
+  void FinishClipSelection(int state);
+  // Listens to the master clip's station while it is targeted; null leaves master-clip mode.
+  void SetMasterClip(const MasterClipRef& masterClip);
+  // The first clip (not transition) before or after `transition` on its track, or null.
+  static TrackItemRef NeighbourClip(const TrackItemRef& transition, bool before);
   void TargetClip(const TrackItemRef& item);
   void TargetTransition(const TrackItemRef& item);
   void SetVisibleRange(TickTime start, TickTime end);
   void UpdateAudioButtons();
   void SetAudioTimeUnits(bool audioUnits);
   void RenameSelectedEffect();
+  void SavePreset();
   void SetEditTime(TickTime time);
+  // Shows the ruler's new zoom [zoomIn, zoomOut] in the list and the keyframe area.
+  void ApplyRulerZoom();
+  void ReloadInOutMarks();
+  void ReloadMarkers();
+  void ReloadTimeDisplays();
+  // A released in, out or in-and-out mark of the ruler: one undoable step.
+  void OnMarkTime(const Message& message);
+  bool OnNavigationCommand(CommandID command);
+  bool IsNavigationCommand(CommandID command) const;
+  bool IsEditingCommand(CommandID command) const;
+  bool CanEdit() const;
+  // The clip through which master-clip times map to sequence times.
+  TrackItemRef GetMasterClipItem() const;
+  TickTime SnapToFrame(TickTime time) const;
+  void OnDeferred(int kind);
+  void Defer(int kind);
+  void SequenceSelectionLinkingChanged();
+  void AudioPartPlayStarted();
+  void AudioPartPlayStopped();
 
   std::string mContextName;
   StationName mStation;
@@ -180,12 +287,14 @@ class EffectControlsView : public TabView,
   std::shared_ptr<EffectControlsListView> mListView;
   std::shared_ptr<EffectControlsKeyframeView> mKeyframeView;
   std::shared_ptr<SubView> mRulerHolder;
-  std::shared_ptr<EffectControlsTimeRuler> mRuler;
+  std::shared_ptr<TimeBarControl> mRuler;
+  std::shared_ptr<ZoomBar> mZoomBar;
   ECWZoomLimiter mZoomLimiter;
   std::shared_ptr<HotTimecodeControl> mTimecode;
   std::shared_ptr<MultiPictureButton> mPlayButton;
   std::shared_ptr<PictureButton> mLoopButton;
-  std::shared_ptr<EffectControlsScrollBar> mScrollBar;
+  std::shared_ptr<ScrollBar> mScrollBar;
+  SequenceMarkers mMarkers;
 
   int mTargetMode = kTargetNone;
   bool mPinned = true;
@@ -203,6 +312,10 @@ class EffectControlsView : public TabView,
   TickTime mSequenceEnd = 0;
   TickTime mEditLine = 0;
   MasterClipRef mMasterClip;
+  TrackItemRef mTargetItem;  // the targeted clip or transition
+  bool mAudioPartPlaying = false;
+  TickTime mPositionBeforeAudioPart = 0;
+  bool mScrubbing = false;
   double mTimePerPixel = -1.0;
   TickTime mVisibleBaseTime = 0;
   int mScrollPosition = -1;

@@ -8,8 +8,6 @@
 #include "Handlers/EffectControls/Src/ECWZoomLimiter.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
-#include "Handlers/EffectControls/Src/EffectControlsScrollBar.h"
-#include "Handlers/EffectControls/Src/EffectControlsTimeRuler.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/MessagingTestScope.h"
@@ -23,79 +21,14 @@
 #include "Host/Model/TransitionData.h"
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/MultiPictureButton.h"
+#include "Host/Toolkit/ScrollBar.h"
+#include "Host/Toolkit/TimeBarControl.h"
 #include "Host/Toolkit/ViewHost.h"
+#include "Tests/Handlers/EffectControls/EffectControlsViewTestSupport.h"
 
 namespace {
 
-constexpr TickTime kSec = kTicksPerSecond;
-constexpr int kS = EffectControlsScrollBar::kWidth;
-
-bool HasAssertion(std::string_view message) {
-  for (const auto& record : RecordedDebugAssertions()) {
-    if (record.message == message) {
-      return true;
-    }
-  }
-  return false;
-}
-
-// A panel in a window over a project with one 25 fps sequence, a video and an audio track.
-class PanelViewTest : public ::testing::Test {
- protected:
-  PanelViewTest() {
-    ColorManager::ResetForTesting();
-    project = Project::Create("Panel");
-    sequence = Sequence::Create("Sequence 01", kFrameRate_25);
-    project->AddSequence(sequence);
-    project->SetActiveSequence(sequence);
-    v1 = Track::Create(MediaType::Video, "V1");
-    a1 = Track::Create(MediaType::Audio, "A1");
-    sequence->AddTrack(v1);
-    sequence->AddTrack(a1);
-    media = Media::Create("Beach.mov", 600 * kSec, true, true);
-    master = MasterClip::Create("Beach.mov", media);
-    project->AddMasterClip(master);
-  }
-
-  ~PanelViewTest() override {
-    if (view) {
-      view->Destroy();
-    }
-    host.reset();
-    view.reset();
-    ColorManager::ResetForTesting();
-  }
-
-  void Open(Size size) {
-    view = std::make_shared<EffectControlsView>(nullptr, "effectcontrols");
-    view->Create("effectcontrols", "Effect Controls", nullptr, true);
-    host = std::make_unique<ViewHost>(size);
-    host->SetRootView(view);
-    view->SetBounds(Rect::FromSize(0, 0, size.width, size.height));
-    view->OnSequenceActivated(sequence);
-  }
-
-  TrackItemRef AddClip(const TrackRef& track, TickTime start, TickTime end, int link = 0) {
-    TrackItemRef item = TrackItem::CreateClip(track->GetMediaType(), start, end, master);
-    track->AddItem(item);
-    if (link != 0) {
-      item->SetLinkGroup(link);
-    }
-    return item;
-  }
-
-  int KeyframeLeft() const { return view->GetKeyframeView()->GetBounds().left; }
-
-  MessagingTestScope scope;
-  ProjectRef project;
-  SequenceRef sequence;
-  TrackRef v1;
-  TrackRef a1;
-  MediaRef media;
-  MasterClipRef master;
-  std::unique_ptr<ViewHost> host;
-  std::shared_ptr<EffectControlsView> view;
-};
+using namespace panel_view_test;
 
 TEST(ECWZoomLimiter, RefusesAMaximumBelowTheMinimumAndKeepsTheRange) {
   MessagingTestScope scope;
@@ -195,8 +128,8 @@ TEST_F(PanelViewTest, LinkedVideoAndAudioSelectedAsTwoGroupsTargetTheClip) {
   EXPECT_EQ(view->GetTargetMode(), EffectControlsView::kTargetClip);
   EXPECT_EQ(view->GetHeader()->GetDisplayMode(), EffectControlsListHeader::kModeClip);
   EXPECT_TRUE(view->GetTimeRuler()->IsEnabled());
-  EXPECT_EQ(view->GetTimeRuler()->GetZoomIn(), 2 * kSec);
-  EXPECT_EQ(view->GetTimeRuler()->GetZoomOut(), 7 * kSec);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomInTime(), 2 * kSec);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomOutTime(), 7 * kSec);
 }
 
 TEST_F(PanelViewTest, TwoUnrelatedClipsShowTheMultipleClipsTextAndDisableTheRuler) {
@@ -222,8 +155,8 @@ TEST_F(PanelViewTest, ATransitionNearTheStartShowsFromZeroToOneDurationPastItsEn
   Open({800, 400});
   sequence->SetSelection({transition});
   ASSERT_EQ(view->GetTargetMode(), EffectControlsView::kTargetTransition);
-  EXPECT_EQ(view->GetTimeRuler()->GetZoomIn(), 0);
-  EXPECT_EQ(view->GetTimeRuler()->GetZoomOut(), 5 * kSec);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomInTime(), 0);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomOutTime(), 5 * kSec);
   EXPECT_EQ(view->GetHeader()->GetDisplayMode(), EffectControlsListHeader::kModeTransition);
   EXPECT_EQ(view->GetHeader()->GetDisplayText(), "Sequence 01 * " + transition->GetName());
 }
@@ -238,9 +171,9 @@ class PanelZoomTest : public PanelViewTest {
     sequence->SetSelection({clip});
     // Show [100 s, 200 s].
     view->ZoomToTimePerPixel(100.0 / view->GetZoomLimiter().GetScrollWidth(), false);
-    view->GetTimeRuler()->SetZoom(100 * kSec, 200 * kSec);
+    view->GetTimeRuler()->SetZoomInOutTime(100 * kSec, 200 * kSec);
     view->ZoomToTimePerPixel(100.0 / view->GetZoomLimiter().GetScrollWidth(), false);
-    ASSERT_EQ(view->GetTimeRuler()->GetZoomIn(), 100 * kSec);
+    ASSERT_EQ(view->GetTimeRuler()->GetZoomInTime(), 100 * kSec);
     time = 100 * kSec + static_cast<TickTime>(fraction * 100 * kSec);
     sequence->SetCurrentTime(time);
     view->ZoomToTimePerPixel(view->GetTimePerPixel() * 0.5, true);
@@ -250,20 +183,20 @@ class PanelZoomTest : public PanelViewTest {
 
 TEST_F(PanelZoomTest, TheCurrentTimeNearTheLeftKeepsTheLeftEdge) {
   SetUpAt(0.10);
-  EXPECT_EQ(view->GetTimeRuler()->GetZoomIn(), 100 * kSec);
-  EXPECT_NEAR(view->GetTimeRuler()->GetZoomOut(), 150 * kSec, kSec / 100);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomInTime(), 100 * kSec);
+  EXPECT_NEAR(view->GetTimeRuler()->GetZoomOutTime(), 150 * kSec, kSec / 100);
 }
 
 TEST_F(PanelZoomTest, TheCurrentTimeNearTheRightKeepsTheRightEdge) {
   SetUpAt(0.90);
-  EXPECT_NEAR(view->GetTimeRuler()->GetZoomIn(), 150 * kSec, kSec / 100);
-  EXPECT_NEAR(view->GetTimeRuler()->GetZoomOut(), 200 * kSec, kSec / 100);
+  EXPECT_NEAR(view->GetTimeRuler()->GetZoomInTime(), 150 * kSec, kSec / 100);
+  EXPECT_NEAR(view->GetTimeRuler()->GetZoomOutTime(), 200 * kSec, kSec / 100);
 }
 
 TEST_F(PanelZoomTest, TheCurrentTimeInTheMiddleStaysInTheMiddle) {
   SetUpAt(0.50);
-  const TickTime in = view->GetTimeRuler()->GetZoomIn();
-  const TickTime out = view->GetTimeRuler()->GetZoomOut();
+  const TickTime in = view->GetTimeRuler()->GetZoomInTime();
+  const TickTime out = view->GetTimeRuler()->GetZoomOutTime();
   EXPECT_NEAR(static_cast<double>(time - in) / static_cast<double>(out - in), 0.5, 1e-6);
   EXPECT_EQ(view->GetListView()->GetVisibleKeyframeTime(), in);
 }
@@ -273,11 +206,11 @@ TEST_F(PanelViewTest, ZoomStaysInsideTheLimiterRange) {
   Open({800, 400});
   sequence->SetSelection({clip});
   view->ZoomToTimePerPixel(1000.0, true);  // far wider than the clip
-  EXPECT_EQ(view->GetTimeRuler()->GetZoomIn(), 10 * kSec);
-  EXPECT_LE(view->GetTimeRuler()->GetZoomOut(), 20 * kSec + kSec / 100);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomInTime(), 10 * kSec);
+  EXPECT_LE(view->GetTimeRuler()->GetZoomOutTime(), 20 * kSec + kSec / 100);
   view->ObeyCommand(EffectControlsView::kZoomInCommand);
-  EXPECT_GE(view->GetTimeRuler()->GetZoomIn(), 10 * kSec);
-  EXPECT_LE(view->GetTimeRuler()->GetZoomOut(), 20 * kSec);
+  EXPECT_GE(view->GetTimeRuler()->GetZoomInTime(), 10 * kSec);
+  EXPECT_LE(view->GetTimeRuler()->GetZoomOutTime(), 20 * kSec);
 }
 
 TEST_F(PanelViewTest, ScrollValuesOfAVeryLongClipAtFineZoomStayWithinRange) {

@@ -10,7 +10,6 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
-#include "Handlers/EffectControls/Src/EffectControlsTimeRuler.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
 #include "Host/Messaging/MessagingTestScope.h"
 #include "Host/Model/Project.h"
@@ -18,6 +17,7 @@
 #include "Host/Model/Sequence.h"
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/Image.h"
+#include "Host/Toolkit/TimeBarControl.h"
 #include "Host/Toolkit/ViewHost.h"
 
 namespace {

@@ -1,0 +1,429 @@
+#include <algorithm>
+
+#include "Handlers/EffectControls/Public/EffectControlsListView.h"
+#include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
+#include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Host/Messaging/Localization.h"
+#include "Host/Model/Component.h"
+#include "Host/Model/ComponentActions.h"
+#include "Host/Model/MasterClip.h"
+#include "Host/Model/Sequence.h"
+#include "Host/Model/SequencePropertyActions.h"
+#include "Host/Model/SequenceSettingsActions.h"
+#include "Host/Toolkit/CommandStatus.h"
+#include "Host/Toolkit/InputBox.h"
+#include "Host/Toolkit/PictureButton.h"
+#include "Host/Toolkit/ShortcutManager.h"
+#include "Host/Toolkit/StandardCommands.h"
+#include "Host/Toolkit/TimeBarControl.h"
+
+bool EffectControlsView::IsNavigationCommand(CommandID command) const {
+  switch (command) {
+    case kMarkInCommand:
+    case kMarkOutCommand:
+    case kGoToInCommand:
+    case kGoToOutCommand:
+    case kClearInCommand:
+    case kClearOutCommand:
+    case kClearInOutCommand:
+    case kAddMarkerCommand:
+    case kClearMarkerCommand:
+    case kClearAllMarkersCommand:
+    case kNextMarkerCommand:
+    case kPreviousMarkerCommand:
+    case kEditMarkerCommand:
+      return true;
+    default:
+      return command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand;
+  }
+}
+
+bool EffectControlsView::OnNavigationCommand(CommandID command) {
+  if (mMasterClip) {
+    switch (command) {
+      case kMarkInCommand:
+        return NavigateMasterClip(kNavMarkIn);
+      case kMarkOutCommand:
+        return NavigateMasterClip(kNavMarkOut);
+      case kGoToInCommand:
+        return NavigateMasterClip(kNavGoToIn);
+      case kGoToOutCommand:
+        return NavigateMasterClip(kNavGoToOut);
+      case kClearInCommand:
+        return NavigateMasterClip(kNavClearIn);
+      case kClearOutCommand:
+        return NavigateMasterClip(kNavClearOut);
+      case kClearInOutCommand:
+        return NavigateMasterClip(kNavClearInOut);
+      case kNextMarkerCommand:
+        return NavigateMasterClip(kNavNextMarker);
+      case kPreviousMarkerCommand:
+        return NavigateMasterClip(kNavPreviousMarker);
+      case kClearAllMarkersCommand:
+        return NavigateMasterClip(kNavClearAllMarkers);
+      default:
+        // Markers added or edited from here are sequence markers in either mode.
+        break;
+    }
+  }
+  if (!mSequence) {
+    return false;
+  }
+  switch (command) {
+    case kMarkInCommand:
+      SequencePropertyActions::SetInPoint(mSequence, SnapToFrame(mEditLine));
+      return true;
+    case kMarkOutCommand: {
+      const TickTime out = std::min(SnapToFrame(mEditLine), mRuler->GetEndTime());
+      SequencePropertyActions::SetOutPoint(mSequence, out);
+      return true;
+    }
+    case kGoToInCommand:
+      SetEditTime(mSequence->GetInPoint().value_or(0));
+      return true;
+    case kGoToOutCommand:
+      if (const auto out = mSequence->GetOutPoint()) {
+        SetEditTime(*out);
+      }
+      return true;
+    case kClearInCommand:
+      SequencePropertyActions::SetInPoint(mSequence, std::nullopt);
+      return true;
+    case kClearOutCommand:
+      SequencePropertyActions::SetOutPoint(mSequence, std::nullopt);
+      return true;
+    case kClearInOutCommand:
+      SequencePropertyActions::SetInOutPoints(mSequence, std::nullopt, std::nullopt);
+      return true;
+    case kAddMarkerCommand:
+      mMarkers.AddAt(mEditLine, 0);
+      return true;
+    case kClearMarkerCommand:
+      mMarkers.RemoveSelectedAt(mEditLine);
+      return true;
+    case kClearAllMarkersCommand:
+      mMarkers.ClearAll();
+      ReloadMarkers();
+      return true;
+    case kNextMarkerCommand:
+    case kPreviousMarkerCommand: {
+      const auto time =
+          command == kNextMarkerCommand ? mMarkers.Next(mEditLine) : mMarkers.Previous(mEditLine);
+      if (time) {
+        SetEditTime(*time);
+        mMarkers.SelectAt(*time);
+        mRuler->Invalidate();
+      }
+      return true;
+    }
+    case kEditMarkerCommand:
+      // The host has no marker editor yet: the marker at the edit line is selected for it.
+      mMarkers.SelectAt(mEditLine);
+      mRuler->Invalidate();
+      return true;
+    default:
+      if (command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand) {
+        mMarkers.AddAt(mEditLine, command - kFirstColoredMarkerCommand);
+        return true;
+      }
+      return false;
+  }
+}
+
+// --- Commands ---
+
+bool EffectControlsView::CanEdit() const {
+  return !mListView->IsReadOnlyEffectContainer() && !(mSequence && mSequence->IsReadOnly());
+}
+
+bool EffectControlsView::IsEditingCommand(CommandID command) const {
+  switch (command) {
+    case kRenameCommand:
+    case kSavePresetCommand:
+    case kEffectsEnabledCommand:
+    case kDeleteEffectCommand:
+    case kResetEffectCommand:
+    case kDeleteAllEffectsCommand:
+    case kCommandPaste:
+    case kCommandClear:
+    case kMarkInCommand:
+    case kMarkOutCommand:
+    case kClearInCommand:
+    case kClearOutCommand:
+    case kClearInOutCommand:
+    case kAddMarkerCommand:
+    case kClearMarkerCommand:
+    case kClearAllMarkersCommand:
+    case kEditMarkerCommand:
+    case kSequenceCommand11008:
+    case kBlendModeNormalCommand:
+    case kBlendModeOtherCommand:
+    case kCapsuleResetAllCommand:
+      return true;
+    default:
+      return (command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand) ||
+             (command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand);
+  }
+}
+
+bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& status) {
+  status = CommandStatus{};
+  const bool editable = CanEdit();
+  const auto snap = [&](EffectControlsKeyframeView::SnapFlag flag) {
+    status.enabled = true;
+    status.checked = mKeyframeView->IsSnapFlagSet(flag);
+    return true;
+  };
+  switch (command) {
+    case kToggleKeyframesCommand:
+      status.enabled = true;
+      status.checked = mKeyframesVisible;
+      return true;
+    case kPinToClipCommand:
+      status.enabled = mTargetMode == kTargetClip;
+      status.checked = mPinned;
+      return true;
+    case kAudioTimeUnitsCommand:
+      status.enabled = mSequence != nullptr;
+      status.checked = mAudioTimeUnits;
+      return true;
+    case kRulerNumbersCommand:
+      status.enabled = true;
+      status.checked = mRuler->AreNumbersShown();
+      return true;
+    case kLoopAudioCommand:
+      status.enabled = mLoopButton && mLoopButton->IsEnabled();
+      status.checked = mAudioLoop;
+      return true;
+    case kPlayAudioCommand:
+      status.enabled = mListView->GetNumberOfAudioParts() == 1 && mListView->CanPlayAudioPart(0);
+      return true;
+    case kZoomInCommand:
+    case kZoomOutCommand:
+      status.enabled = mTargetMode != kTargetNone && mKeyframesVisible;
+      return true;
+    case kToggleSnappingCommand:
+      return snap(EffectControlsKeyframeView::kSnapKeyframes);
+    case kSnapToVideoCommand:
+      return snap(EffectControlsKeyframeView::kSnapVideo);
+    case kSnapToAudioCommand:
+      return snap(EffectControlsKeyframeView::kSnapAudio);
+    case kSnapToMarkersCommand:
+      return snap(EffectControlsKeyframeView::kSnapMarkers);
+    case kSnapToCurrentTimeCommand:
+      return snap(EffectControlsKeyframeView::kSnapCurrentTime);
+    case kSnapToClipCommand:
+      return snap(EffectControlsKeyframeView::kSnapClip);
+    case kSnapToAllCommand:
+    case kSnapToNoneCommand:
+      status.enabled = true;
+      return true;
+    case kRenameCommand: {
+      const auto& entries = mListView->GetSelectedItems().GetEntries();
+      status.enabled = editable && entries.size() == 1 && entries.front().component &&
+                       !entries.front().component->IsGraphicsComponent();
+      return true;
+    }
+    default:
+      break;
+  }
+  if (IsNavigationCommand(command)) {
+    const bool target = mSequence != nullptr || mMasterClip != nullptr;
+    status.enabled = target && (editable || !IsEditingCommand(command));
+    return true;
+  }
+  switch (command) {
+    case kSavePresetCommand:
+    case kEffectsEnabledCommand:
+    case kDeleteEffectCommand:
+    case kResetEffectCommand:
+    case kDeleteAllEffectsCommand:
+    case kCommandClear:
+      // The list answers for its effect commands; they stay off until it does.
+      if (!mListView->FindCommandStatus(command, status)) {
+        status = CommandStatus{};
+      }
+      status.enabled = status.enabled && editable;
+      return true;
+    case kCommandPaste:
+      if (!mListView->FindCommandStatus(command, status) || !status.enabled) {
+        status = CommandStatus{};
+        mKeyframeView->FindCommandStatus(command, status);
+      }
+      status.enabled = status.enabled && editable;
+      return true;
+    case kKeyframeAreaCommand:
+      if (!mKeyframeView->FindCommandStatus(command, status)) {
+        status = CommandStatus{};
+      }
+      return true;
+    case kSequenceCommand11008:
+    case kBlendModeNormalCommand:
+    case kBlendModeOtherCommand:
+    case kCapsuleResetAllCommand:
+      // Blend modes and capsule parameters have no host actions yet: off.
+      status.enabled = false;
+      return true;
+    default:
+      if (command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand) {
+        status.enabled = false;
+        return true;
+      }
+      break;
+  }
+  if (command > kPlayAudioCommand && command < kPlayAudioCommand + 50) {
+    return mListView->FindCommandStatus(command, status);
+  }
+  return TabView::FindCommandStatus(command, status);
+}
+
+bool EffectControlsView::ObeyCommand(CommandID command) {
+  if (IsEditingCommand(command) && !CanEdit()) {
+    // A read-only container takes editing commands and does nothing.
+    return true;
+  }
+  const auto snap = [this](EffectControlsKeyframeView::SnapFlag flag) {
+    mKeyframeView->ToggleSnapFlag(flag);
+    return true;
+  };
+  switch (command) {
+    case kToggleKeyframesCommand:
+      ToggleKeyframesVisible();
+      return true;
+    case kZoomInCommand:
+      ZoomToTimePerPixel(mTimePerPixel * 0.5, true);
+      return true;
+    case kZoomOutCommand:
+      ZoomToTimePerPixel(mTimePerPixel * 2.0, true);
+      return true;
+    case kPinToClipCommand:
+      if (mTargetMode == kTargetClip) {
+        mPinned = !mPinned;
+        mKeyframeView->SetPinToClip(mPinned);
+        SetupTimeBarZoomMinMax(mSelectedGroups);
+        const int K = std::max(1, mZoomLimiter.GetScrollWidth());
+        const TickTime span = mRuler->GetZoomOutTime() - mRuler->GetZoomInTime();
+        // Forces the re-application: the same value would keep the range as it is.
+        mTimePerPixel = -1.0;
+        ZoomToTimePerPixel(static_cast<double>(span) / kTicksPerSecond / K, true);
+      }
+      return true;
+    case kAudioTimeUnitsCommand:
+      SetAudioTimeUnits(!mAudioTimeUnits);
+      if (mSequence) {
+        SequenceSettingsActions::SetAudioFrameAligned(mSequence, mAudioTimeUnits);
+      }
+      return true;
+    case kRulerNumbersCommand:
+      mRuler->SetShowNumbers(!mRuler->AreNumbersShown());
+      return true;
+    case kLoopAudioCommand:
+      mAudioLoop = !mAudioLoop;
+      if (mLoopButton) {
+        mLoopButton->SetSelected(mAudioLoop);
+      }
+      // The list's loop mode arrives with audio part playback.
+      return true;
+    case kPlayAudioCommand:
+      if (mListView->GetNumberOfAudioParts() == 1 && mListView->CanPlayAudioPart(0)) {
+        // Playing a part belongs to the list (audio part playback is not built yet).
+        mListView->ObeyCommand(EffectControlsListView::kPlayAudioPartCommand);
+      }
+      return true;
+    case kToggleSnappingCommand:
+      return snap(EffectControlsKeyframeView::kSnapKeyframes);
+    case kSnapToVideoCommand:
+      return snap(EffectControlsKeyframeView::kSnapVideo);
+    case kSnapToAudioCommand:
+      return snap(EffectControlsKeyframeView::kSnapAudio);
+    case kSnapToMarkersCommand:
+      return snap(EffectControlsKeyframeView::kSnapMarkers);
+    case kSnapToCurrentTimeCommand:
+      return snap(EffectControlsKeyframeView::kSnapCurrentTime);
+    case kSnapToClipCommand:
+      return snap(EffectControlsKeyframeView::kSnapClip);
+    case kSnapToAllCommand:
+      mKeyframeView->SetSnapFlags(mKeyframeView->GetSnapFlags() |
+                                  EffectControlsKeyframeView::kSnapTargets);
+      return true;
+    case kSnapToNoneCommand:
+      mKeyframeView->SetSnapFlags(mKeyframeView->GetSnapFlags() &
+                                  ~EffectControlsKeyframeView::kSnapTargets);
+      return true;
+    case kRenameCommand:
+      RenameSelectedEffect();
+      return true;
+    case kSavePresetCommand:
+      SavePreset();
+      return true;
+    case kEffectsEnabledCommand:
+    case kDeleteEffectCommand:
+    case kResetEffectCommand:
+    case kDeleteAllEffectsCommand:
+    case kCommandClear:
+      // Effect commands are the list's (its effect commands and clipboard are not built yet).
+      return mListView->ObeyCommand(command) || command != kCommandClear ||
+             mKeyframeView->ObeyCommand(command);
+    case kCommandPaste:
+      // Effects first; keyframes when the clipboard holds no effects.
+      if (!mListView->ObeyCommand(command)) {
+        mKeyframeView->ObeyCommand(command);
+      }
+      return true;
+    case kKeyframeAreaCommand:
+      mKeyframeView->ObeyCommand(command);
+      return true;
+    default:
+      break;
+  }
+  if (IsNavigationCommand(command)) {
+    OnNavigationCommand(command);
+    return true;
+  }
+  if (command > kPlayAudioCommand && command < kPlayAudioCommand + 50) {
+    return mListView->ObeyCommand(command);
+  }
+  return TabView::ObeyCommand(command);
+}
+
+void EffectControlsView::SetAudioTimeUnits(bool audioUnits) {
+  mAudioTimeUnits = audioUnits;
+  ReloadTimeDisplays();
+  mRuler->SetAudioTimeUnits(audioUnits);
+  // The list's audio frame alignment arrives with the keyframe area's audio-unit snapping.
+  if (mKeyframesVisible && mTimePerPixel > 0.0) {
+    ZoomToTimePerPixel(mTimePerPixel, false);
+  }
+}
+
+void EffectControlsView::RenameSelectedEffect() {
+  const auto& entries = mListView->GetSelectedItems().GetEntries();
+  if (entries.size() != 1 || !CanEdit()) {
+    return;
+  }
+  const ComponentRef component = entries.front().component;
+  if (!component || component->IsGraphicsComponent()) {
+    return;
+  }
+  const auto name =
+      InputBox::Ask(LocalizeString("$$$/Vantile/Handlers/EffectControls/RenameItem=Rename Item"),
+                    LocalizeString("$$$/Vantile/Handlers/EffectControls/NewName=New Name"),
+                    component->GetInstanceName());
+  if (name && !name->empty() && *name != component->GetInstanceName()) {
+    ComponentActions::SetInstanceName(component, *name);
+  }
+}
+
+void EffectControlsView::SavePreset() {
+  // The host has no save-preset dialog yet; the list decides whether presets may be saved.
+  mListView->ObeyCommand(kSavePresetCommand);
+}
+
+void EffectControlsView::NowOnDuty() {
+  ShortcutManager::Instance().SetActiveContext(mContextName);
+  if (mSequenceChangedOffDuty && mSequence) {
+    mSequenceChangedOffDuty = false;
+    OnSequenceChanged(mSequence);
+  }
+  ReloadMarkers();
+}
