@@ -48,9 +48,9 @@ class PopupControl : public SubView {
     bool enabled = true;
   };
 
-  // Menu commands of plain items are this base plus the item's index; keep owner commands
-  // below it.
-  static constexpr CommandID kPlainItemCommandBase = 0x7E000000;
+  // The menu command of a plain item is this base plus the item's index (what a script's
+  // menu answer names: 1000002 picks the third item). Owner commands stay below it.
+  static constexpr CommandID kPlainItemCommandBase = 1000000;
 
   ~PopupControl() override;
 

@@ -58,15 +58,6 @@ TEST_F(PicturePopupTest, TheOwnerMaySelectAnotherItemThanTheOneChosen) {
   EXPECT_EQ(popup->GetSelectedIndex(), 0);
 }
 
-TEST_F(PicturePopupTest, ArrowKeysChoosePresetsThroughTheOwner) {
-  menus->PushAnswer(std::nullopt);
-  Click(kBounds.Center());
-  Key(KeyCode::kDown);
-  Key(KeyCode::kDown);
-  EXPECT_EQ(Commands(), (Lines{"root command 18601", "root command 18602"}));
-  EXPECT_EQ(popup->GetSelectedIndex(), 2);
-}
-
 TEST_F(PicturePopupTest, ADisabledPopupIsFadedAndInert) {
   host.Render();
   const Image enabled = host.GetImage().Clone();
