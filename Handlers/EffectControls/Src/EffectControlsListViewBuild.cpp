@@ -43,6 +43,18 @@ bool HasCustomAudioUI(const Component& component) {
   return component.GetMediaType() == MediaType::Audio && component.HasSetupDialog();
 }
 
+// The first item of a group's video or audio items; a group that lists a missing item is a
+// broken model, reported as a missing interface (the rebuild then ends).
+const TrackItemRef* FirstItem(const std::vector<TrackItemRef>& items) {
+  if (items.empty()) {
+    return nullptr;
+  }
+  if (!items.front()) {
+    throw NullInterfaceException("ITrackItem");
+  }
+  return &items.front();
+}
+
 // One group row open while a component's parameters are walked.
 struct OpenGroup {
   std::shared_ptr<EffectItem> row;
@@ -190,13 +202,11 @@ void EffectControlsListView::RebuildVideoClipView(const TrackItemGroup* inTrackI
   if (inTrackItemGroup == nullptr) {
     return;
   }
-  if (inTrackItemGroup->videoItems.empty()) {
+  const TrackItemRef* first = FirstItem(inTrackItemGroup->videoItems);
+  if (first == nullptr || !(*first)->IsClip()) {
     return;
   }
-  const TrackItemRef item = inTrackItemGroup->videoItems.front();
-  if (!item->IsClip()) {
-    return;
-  }
+  const TrackItemRef item = *first;
   mVideoTrackItemStation = item->GetStation();
   ListenTo(mVideoTrackItemStation);
   if (mMasterClip) {
@@ -315,7 +325,8 @@ void EffectControlsListView::RebuildAudioClipView(const TrackItemGroup* inTrackI
     return;
   }
   const std::vector<TrackItemRef>& items = inTrackItemGroup->audioItems;
-  if (items.empty() || !items.front()->IsClip() || mMasterClip) {
+  const TrackItemRef* first = FirstItem(items);
+  if (first == nullptr || !(*first)->IsClip() || mMasterClip) {
     return;
   }
   LoadAudioFilters(items);
@@ -427,16 +438,16 @@ void EffectControlsListView::RebuildTransitionView(const TrackItemGroup* inTrack
     return;
   }
   if (mShowVideo) {
-    if (!inTrackItemGroup->videoItems.empty() &&
-        inTrackItemGroup->videoItems.front()->IsTransition()) {
-      const TrackItemRef item = inTrackItemGroup->videoItems.front();
+    const TrackItemRef* first = FirstItem(inTrackItemGroup->videoItems);
+    if (first != nullptr && (*first)->IsTransition()) {
+      const TrackItemRef item = *first;
       LoadVideoTransition(item);
       mVideoTrackItem = item;
     }
   } else if (mShowAudio) {
-    if (!inTrackItemGroup->audioItems.empty() &&
-        inTrackItemGroup->audioItems.front()->IsTransition()) {
-      const TrackItemRef item = inTrackItemGroup->audioItems.front();
+    const TrackItemRef* first = FirstItem(inTrackItemGroup->audioItems);
+    if (first != nullptr && (*first)->IsTransition()) {
+      const TrackItemRef item = *first;
       LoadAudioTransition(item);
       mAudioTransitionItem = item;
     }
@@ -453,11 +464,11 @@ void EffectControlsListView::RebuildTransitionComponentView(
   if (mVideoExpander) {
     mVideoExpander->SetValue(0);
   }
-  if (inTrackItemGroup->videoItems.empty() ||
-      !inTrackItemGroup->videoItems.front()->IsTransition()) {
+  const TrackItemRef* first = FirstItem(inTrackItemGroup->videoItems);
+  if (first == nullptr || !(*first)->IsTransition()) {
     return;
   }
-  const TrackItemRef item = inTrackItemGroup->videoItems.front();
+  const TrackItemRef item = *first;
   LoadVideoTransition(item);
   mVideoTrackItem = item;
   NewKeyframeSelection();

@@ -664,3 +664,25 @@ TEST_F(ListViewTest, AltToggleSwitchesEveryEffectOfTheTargetAsOneUndoStep) {
 }
 
 }  // namespace
+
+namespace {
+
+TEST_F(ListViewTest, AGroupListingAMissingItemReportsAMissingInterfaceAndBuildsNothing) {
+  TrackItemGroup video;
+  video.videoItems = {nullptr};
+  TrackItemGroup audio;
+  audio.audioItems = {nullptr};
+  EXPECT_THROW(list->RebuildVideoClipView(&video), NullInterfaceException);
+  EXPECT_THROW(list->RebuildTransitionComponentView(&video), NullInterfaceException);
+  EXPECT_THROW(list->RebuildAudioClipView(&audio), NullInterfaceException);
+  list->SetShowVideo(true);
+  EXPECT_THROW(list->RebuildTransitionView(&video), NullInterfaceException);
+  list->SetShowVideo(false);
+  list->SetShowAudio(true);
+  EXPECT_THROW(list->RebuildTransitionView(&audio), NullInterfaceException);
+  EXPECT_TRUE(list->GetVideoItems().IsEmpty());
+  EXPECT_TRUE(list->GetAudioParts().empty());
+  EXPECT_EQ(list->GetVideoTrackItem(), nullptr);
+}
+
+}  // namespace
