@@ -426,4 +426,8 @@ void EffectControlsView::NowOnDuty() {
     OnSequenceChanged(mSequence);
   }
   ReloadMarkers();
+  if (IsTarget()) {
+    // Keys go to the list first; it passes what it does not take up to the panel.
+    mListView->BecomeTarget();
+  }
 }

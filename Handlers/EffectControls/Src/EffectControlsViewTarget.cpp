@@ -341,17 +341,25 @@ void EffectControlsView::OnSequenceChanged(const SequenceRef& sequence, bool set
   const bool stillThere = target && sequence->Contains(target.get());
   if (sameSelection && stillThere && mTargetMode != kTargetNone && IsShown()) {
     if (mTargetMode == kTargetTransition) {
+      mClipStart = target->GetStart();
+      mClipEnd = target->GetEnd();
+      mKeyframeView->SetClipSpan(mClipStart, mClipEnd);
       SetVisibleRange(mRuler->GetZoomInTime(), mRuler->GetZoomOutTime());
-    } else if (mPinned) {
+    } else {
       const auto [start, end] = GetTrackItemStartAndEnd(target);
-      if (start != mClipStart || end != mClipEnd) {
+      const bool moved = start != mClipStart || end != mClipEnd;
+      // The clip's band follows a trim or a move whether or not the area is pinned to it.
+      mClipStart = start;
+      mClipEnd = end;
+      mKeyframeView->SetClipSpan(start, end);
+      if (mPinned && moved) {
         mRuler->SetTimeRange(0, sequence->GetEnd());
         SetupTimeBarZoomMinMax(mSelectedGroups);
-        mClipStart = start;
-        mClipEnd = end;
-        mKeyframeView->SetClipSpan(start, end);
         SetVisibleRange(start, end);
         SetEditTime(sequence->GetCurrentTime());
+      } else if (!mPinned && sequence->GetEnd() != mSequenceEnd) {
+        SetupTimeBarZoomMinMax(mSelectedGroups);
+        ZoomToTimePerPixel(mTimePerPixel, false);
       }
     }
     mKeyframeView->Invalidate();

@@ -36,12 +36,16 @@ void EffectControlsView::ZoomToTimePerPixel(double secondsPerPixel, bool keepCur
   }
   const TickTime minimum = mZoomLimiter.GetMinTime();
   const TickTime maximum = mZoomLimiter.GetMaxTime();
+  TickTime end = AddTimes(start, span);
   if (mZoomLimiter.GetDuration() < span) {
     start = minimum;
+    end = maximum;
   } else if (start < minimum) {
     start = minimum;
-  } else if (start + span > maximum) {
+    end = start + span;
+  } else if (end > maximum) {
     start = maximum - span;
+    end = maximum;
   }
   start = mZoomLimiter.ClampTime(start);
   mVisibleBaseTime = start;
@@ -50,8 +54,8 @@ void EffectControlsView::ZoomToTimePerPixel(double secondsPerPixel, bool keepCur
   mListView->SetVisibleKeyframeTime(start);
   mListView->SetTimePerPixel(s);
   mKeyframeView->Invalidate();
-  if (span > 0) {
-    mRuler->SetZoomInOutTime(start, start + span);
+  if (end > start) {
+    mRuler->SetZoomInOutTime(start, end);
   }
 }
 

@@ -363,3 +363,46 @@ TEST_F(PanelCommandTest, NavigationActsOnATargetedMasterClipInItsMediaTime) {
 }
 
 }  // namespace
+
+namespace {
+
+using namespace panel_view_test;
+
+TEST_F(PanelViewTest, TrimmingAPinnedClipFitsTheViewToItsNewSpan) {
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 12 * kSec);
+  Open({800, 400});
+  sequence->SetSelection({clip});
+  ASSERT_TRUE(clip->SetTimes(2 * kSec, 8 * kSec, 0));
+  EXPECT_EQ(view->GetClipStart(), 2 * kSec);
+  EXPECT_EQ(view->GetClipEnd(), 8 * kSec);
+  EXPECT_EQ(view->GetZoomLimiter().GetMaxTime(), 8 * kSec);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomInTime(), 2 * kSec);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomOutTime(), 8 * kSec);
+}
+
+TEST_F(PanelViewTest, TrimmingAnUnpinnedClipMovesItsBandAndKeepsTheZoom) {
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 12 * kSec);
+  AddClip(v1, 20 * kSec, 30 * kSec);
+  Open({800, 400});
+  sequence->SetSelection({clip});
+  view->ObeyCommand(EffectControlsView::kPinToClipCommand);
+  ASSERT_FALSE(view->IsPinned());
+  const double zoom = view->GetTimePerPixel();
+  ASSERT_TRUE(clip->SetTimes(4 * kSec, 12 * kSec, 2 * kSec));
+  EXPECT_EQ(view->GetClipStart(), 4 * kSec);
+  EXPECT_DOUBLE_EQ(view->GetTimePerPixel(), zoom);
+  EXPECT_EQ(view->GetZoomLimiter().GetMaxTime(), 30 * kSec);
+}
+
+TEST_F(PanelViewTest, ZoomingOutPastTheRangeShowsTheWholeRange) {
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 12 * kSec);
+  Open({800, 400});
+  sequence->SetSelection({clip});
+  view->ObeyCommand(EffectControlsView::kZoomOutCommand);
+  view->ObeyCommand(EffectControlsView::kZoomOutCommand);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomInTime(), 2 * kSec);
+  EXPECT_EQ(view->GetTimeRuler()->GetZoomOutTime(), 12 * kSec);
+  EXPECT_EQ(view->GetVisibleBaseTime(), 2 * kSec);
+}
+
+}  // namespace

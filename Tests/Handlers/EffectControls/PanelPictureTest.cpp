@@ -16,9 +16,12 @@
 #include "Host/Model/ProjectFile.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Toolkit/ColorManager.h"
+#include "Host/Toolkit/HotTimecodeControl.h"
 #include "Host/Toolkit/Image.h"
+#include "Host/Toolkit/ScrollBar.h"
 #include "Host/Toolkit/TimeBarControl.h"
 #include "Host/Toolkit/ViewHost.h"
+#include "Host/Toolkit/ZoomBar.h"
 
 namespace {
 
@@ -145,6 +148,40 @@ TEST_F(PanelPicture, TheKeyframeAreaShowsItsBackgroundOverTheClip) {
   const Rect area = InWindow(*view->GetKeyframeView());
   const Color background = ColorManager::GetColor("colors.effectscontrols.keyframeview.background");
   EXPECT_GT(CountNear(image, area, background, 8), area.Width() * area.Height() / 4);
+}
+
+TEST_F(PanelPicture, TheZoomBarScrollBarAndBottomBarSitWhereThePanelPutsThem) {
+  const Image& image = host->GetImage();
+  const Rect zoomBar = InWindow(*view->GetZoomBar());
+  const Rect ruler = InWindow(*view->GetTimeRuler());
+  const Rect scrollBar = InWindow(*view->GetScrollBar());
+  const Rect keyframes = InWindow(*view->GetKeyframeView());
+  // The zoom bar sits on top of the ruler, both over the keyframe area.
+  EXPECT_EQ(zoomBar.bottom, ruler.top);
+  EXPECT_EQ(zoomBar.left, keyframes.left);
+  EXPECT_EQ(ruler.bottom, keyframes.top);
+  EXPECT_EQ(ruler.Width(), keyframes.Width());
+  // The scroll bar runs down the right edge, beside the keyframe area's 4 px gap.
+  EXPECT_EQ(scrollBar.right, kSize.width);
+  EXPECT_EQ(scrollBar.left, keyframes.right + EffectControlsView::kSeparatorGap);
+  // The scroll bar and the zoom bar's thumb are drawn, not left as background.
+  const Color background = ColorManager::GetColor(kColor_WindowBackground);
+  EXPECT_GT(CountAway(image, scrollBar, background, 10), scrollBar.Height());
+  const Rect thumb = view->GetZoomBar()->LocalToWindow(view->GetZoomBar()->GetThumbRect());
+  EXPECT_FALSE(thumb.IsEmpty());
+  EXPECT_GT(CountAway(image, thumb, background, 10), thumb.Width());
+  // The current-time field shows its timecode at the bottom left.
+  const Rect timecode = InWindow(*view->GetTimecodeControl());
+  EXPECT_EQ(timecode.left, 5);
+  EXPECT_GT(CountAway(image, timecode, background, 100), 30);
+  // A crisp 1 px line separates the list from the keyframe area: one colour down the column
+  // left of the area, unlike the area's own first column.
+  const int x = keyframes.left - 1;
+  const Rect column{x, keyframes.top, x + 1, keyframes.bottom};
+  const Color line = image.GetPixel(x, keyframes.top + keyframes.Height() / 2);
+  EXPECT_GT(CountNear(image, column, line, 6), keyframes.Height() * 9 / 10);
+  EXPECT_LT(CountNear(image, Rect{x + 1, keyframes.top, x + 2, keyframes.bottom}, line, 6),
+            keyframes.Height() / 2);
 }
 
 }  // namespace
