@@ -14,12 +14,14 @@
 #include "Host/Model/TrackItem.h"
 #include "Host/Rows/AngleParameter.h"
 #include "Host/Rows/CheckboxParameter.h"
+#include "Host/Rows/ColorPickerParameter.h"
 #include "Host/Rows/DoubleSliderParameter.h"
 #include "Host/Rows/EffectItem.h"
 #include "Host/Rows/FloatSliderParameter.h"
 #include "Host/Rows/GroupBeginParameter.h"
 #include "Host/Rows/InfoParameter.h"
 #include "Host/Rows/LinkedPointPickerParameter.h"
+#include "Host/Rows/MenuParameter.h"
 #include "Host/Rows/PointPickerParameter.h"
 #include "Host/Rows/SliderParameter.h"
 #include "Host/Rows/SpreadsheetParameter.h"
@@ -139,8 +141,12 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
       rows.push_back(std::make_shared<CheckboxParameter>(info));
       break;
     case ParamType::Color:
-      rows.push_back(ValueStandIn(
-          IsChromil(info.component) ? "OffscreenPickerParameter" : "ColorPickerParameter", info));
+      if (IsChromil(info.component)) {
+        rows.push_back(HostRowStandIn<ColorPickerParameter>("OffscreenPickerParameter",
+                                                            "ColorPickerParameter", info));
+      } else {
+        rows.push_back(std::make_shared<ColorPickerParameter>(info));
+      }
       break;
     case ParamType::Point:
       if (ownSliderRows) {
@@ -154,7 +160,7 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
       }
       break;
     case ParamType::Menu:
-      rows.push_back(ValueStandIn("MenuParameter", info));
+      rows.push_back(std::make_shared<MenuParameter>(info));
       break;
     case ParamType::DoubleSlider:
     case ParamType::TimeRemapping:
