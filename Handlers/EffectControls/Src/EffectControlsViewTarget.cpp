@@ -176,8 +176,8 @@ int EffectControlsView::SequenceClipSelectionChangedForOneTrackItem(const TrackI
 
 int EffectControlsView::SequenceClipSelectionChangedForMultipleTrackItems(
     const std::vector<TrackItemGroup>& groups, TrackItemRef& video, TrackItemRef& audio) {
-  // The groups form one linked set when every item of every group is linked to the others
-  // (one clip's video and audio selected as separate groups).
+  // One clip's video and audio selected as two groups of one item each, linked to each other:
+  // the rule the list builds by, so the header and the list always agree.
   std::vector<TrackItemRef> videos;
   std::vector<TrackItemRef> audios;
   for (const TrackItemGroup& group : groups) {
@@ -187,21 +187,15 @@ int EffectControlsView::SequenceClipSelectionChangedForMultipleTrackItems(
     videos.insert(videos.end(), group.videoItems.begin(), group.videoItems.end());
     audios.insert(audios.end(), group.audioItems.begin(), group.audioItems.end());
   }
-  const TrackItemRef first = !videos.empty() ? videos.front() : audios.front();
-  bool linked = first->IsClip() && first->GetLinkGroup() != 0 && videos.size() <= 1;
-  for (const auto* items : {&videos, &audios}) {
-    for (const TrackItemRef& item : *items) {
-      linked = linked && item->IsClip() && item->GetLinkGroup() == first->GetLinkGroup();
-    }
-  }
+  const bool linked = groups.size() == 2 && videos.size() == 1 && audios.size() == 1 &&
+                      videos.front()->IsClip() && audios.front()->IsClip() &&
+                      videos.front()->GetLinkGroup() != 0 &&
+                      videos.front()->GetLinkGroup() == audios.front()->GetLinkGroup();
   if (!linked) {
     return 0;
   }
-  if (!videos.empty()) {
-    video = videos.front();
-  } else {
-    audio = audios.front();
-  }
+  video = videos.front();
+  audio = audios.front();
   return static_cast<int>(audios.size());
 }
 

@@ -14,6 +14,7 @@
 #include "Host/Messaging/Station.h"
 #include "Host/Model/MarkerActions.h"
 #include "Host/Model/ModelMessages.h"
+#include "Host/Model/TrackItemGroup.h"
 #include "Host/Toolkit/CommandStatus.h"
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/HotTimecodeControl.h"
@@ -403,6 +404,47 @@ TEST_F(PanelViewTest, ZoomingOutPastTheRangeShowsTheWholeRange) {
   EXPECT_EQ(view->GetTimeRuler()->GetZoomInTime(), 2 * kSec);
   EXPECT_EQ(view->GetTimeRuler()->GetZoomOutTime(), 12 * kSec);
   EXPECT_EQ(view->GetVisibleBaseTime(), 2 * kSec);
+}
+
+TEST_F(PanelViewTest, ALinkedClipsVideoAndTwoAudioItemsAsThreeGroupsAreSeveralClips) {
+  // Only one video and one audio item of one clip make a linked pair, as the list builds it.
+  const TrackItemRef video = AddClip(v1, 2 * kSec, 7 * kSec, 1);
+  const TrackItemRef left = AddClip(a1, 2 * kSec, 7 * kSec, 1);
+  const TrackRef a2 = Track::Create(MediaType::Audio, "A2");
+  sequence->AddTrack(a2);
+  const TrackItemRef right = AddClip(a2, 2 * kSec, 7 * kSec, 1);
+  Open({800, 400});
+  sequence->SetSelectedGroups(
+      {TrackItemGroup{{video}, {}}, TrackItemGroup{{}, {left}}, TrackItemGroup{{}, {right}}});
+  EXPECT_EQ(view->GetTargetMode(), EffectControlsView::kTargetNone);
+  EXPECT_EQ(view->GetHeader()->GetDisplayText(), "Multiple clips selected");
+}
+
+TEST_F(PanelViewTest, AnEmptyGroupIsReportedAndGivesNoCandidate) {
+  // The sequence never hands out an empty group; the view still refuses one.
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 7 * kSec);
+  Open({800, 400});
+  TrackItemRef video;
+  TrackItemRef audio;
+  EXPECT_EQ(view->SequenceClipSelectionChangedForOneTrackItem(TrackItemGroup{}, video, audio), 0);
+  EXPECT_TRUE(HasAssertion("Invalid TrackItemGroup"));
+  EXPECT_EQ(view->SequenceClipSelectionChangedForMultipleTrackItems(
+                {TrackItemGroup{{clip}, {}}, TrackItemGroup{}}, video, audio),
+            0);
+  EXPECT_EQ(video, nullptr);
+  EXPECT_EQ(audio, nullptr);
+}
+
+TEST_F(PanelViewTest, AStackedPanelHasNoScrollBarAndTheListTakesItsPlace) {
+  Open({800, 400});
+  view->ObeyCommand(EffectControlsView::kToggleKeyframesCommand);  // list across the panel
+  view->SetStacked(true);
+  EXPECT_FALSE(view->GetScrollBar()->IsVisible());
+  EXPECT_EQ(view->GetListView()->GetBounds().right, 800 - 4);
+  view->SetStacked(false);
+  EXPECT_TRUE(view->GetScrollBar()->IsVisible());
+  EXPECT_EQ(view->GetListView()->GetBounds().right, 800 - 4 - kS);
+  EXPECT_EQ(view->GetMaxStackedHeight(), view->GetListView()->GetMaxHeight() + 60);
 }
 
 }  // namespace
