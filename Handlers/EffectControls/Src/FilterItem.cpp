@@ -22,10 +22,9 @@
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/ImageList.h"
 #include "Host/Toolkit/KeyModifiers.h"
-#include "Host/Toolkit/Menu.h"
-#include "Host/Toolkit/MenuTracker.h"
 #include "Host/Toolkit/MultiPictureButton.h"
 #include "Host/Toolkit/PictureButton.h"
+#include "Host/Toolkit/PicturePopup.h"
 #include "Host/Toolkit/ViewBase.h"
 
 namespace {
@@ -55,32 +54,6 @@ Rect DecalRect(Decal decal, int x, int y) {
   const Size size = GetDecalSize(decal);
   return Rect::FromSize(x, y, size.width, size.height);
 }
-
-// The picture button whose click opens a menu of the effect's presets; choosing one sends its
-// command (18600 + index) to the row, which also reports which preset is current.
-class PresetPopupButton : public PictureButton {
- public:
-  PresetPopupButton(const Rect& bounds, Commander* row, std::vector<std::string> presetNames)
-      : PictureButton(bounds, kNoCommand, kEffectControlsPresetNormalDecal, row),
-        mRow(row),
-        mPresetNames(std::move(presetNames)) {}
-
- protected:
-  bool ClickSelf(KeyModifiers /*modifiers*/) override {
-    Menu menu("EffectControls_Presets");
-    const std::size_t count = std::min<std::size_t>(
-        mPresetNames.size(), FilterItem::kLastPresetCommand - FilterItem::kFirstPresetCommand + 1);
-    for (std::size_t i = 0; i < count; ++i) {
-      menu.AddCommand(FilterItem::kFirstPresetCommand + static_cast<CommandID>(i), mPresetNames[i]);
-    }
-    const Point below = LocalToWindow(Point{0, GetBounds().Height()});
-    return RunPopupMenu(menu, *mRow, below).has_value();
-  }
-
- private:
-  Commander* mRow;  // the effect row; it owns this button and destroys it first
-  std::vector<std::string> mPresetNames;
-};
 
 bool ComputeReadOnly(const TrackItemRef& trackItem, const MasterClipRef& masterClip,
                      const ComponentRef& component) {
@@ -199,15 +172,20 @@ void FilterItem::FinishCreateSelf() {
       mResetButton->SetEnabled(!mOffline && !mReadOnly);
     }
   } else if (presetCount >= 2) {
-    std::vector<std::string> names;
-    names.reserve(presetCount);
-    for (const ComponentPreset& preset : mComponent->GetPresets()) {
-      names.push_back(preset.name);
+    // Items send their commands (18600 + index) to this row, which applies the preset and
+    // answers which one is current; no command past 18999 is used.
+    auto popup = std::make_shared<PicturePopup>(DecalRect(kEffectControlsPresetNormalDecal, 0, 0),
+                                                kEffectControlsPresetNormalDecal, 0, this);
+    const std::size_t count = std::min<std::size_t>(
+        presetCount, static_cast<std::size_t>(kLastPresetCommand - kFirstPresetCommand + 1));
+    for (std::size_t i = 0; i < count; ++i) {
+      popup->AddItem(mComponent->GetPresets()[i].name,
+                     kFirstPresetCommand + static_cast<CommandID>(i));
     }
-    mPresetPopup = AdoptControl(std::make_shared<PresetPopupButton>(
-        DecalRect(kEffectControlsPresetNormalDecal, 0, 0), this, std::move(names)));
+    mPresetPopup = AdoptControl(std::move(popup));
     if (mPresetPopup) {
       mPresetPopup->SetEnabled(!mReadOnly);
+      UpdatePresetSelection();
     }
   }
 
@@ -234,6 +212,7 @@ void FilterItem::ListenToMessage(const Message& message) {
     if (changed->component == mComponent && !mOffline) {
       mEnabled = mComponent->IsEnabled();
       UpdateSwitch();
+      UpdatePresetSelection();  // an undo may have brought another preset back
     }
     return;
   }
@@ -351,7 +330,18 @@ void FilterItem::ChoosePreset(int index) {
     return;
   }
   if (ComponentActions::ApplyPreset(mComponent, index) == EditStatus::Done) {
+    UpdatePresetSelection();
     BroadcastToMonitor();
+  }
+}
+
+void FilterItem::UpdatePresetSelection() {
+  if (!mPresetPopup || !mComponent) {
+    return;
+  }
+  const int current = mComponent->GetCurrentPreset();
+  if (current < 0 || !mPresetPopup->SelectCommand(kFirstPresetCommand + current)) {
+    mPresetPopup->SetSelectedIndex(-1);
   }
 }
 

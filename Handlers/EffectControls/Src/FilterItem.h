@@ -17,6 +17,7 @@ class CheckBoxControl;
 class ImageList;
 class MultiPictureButton;
 class PictureButton;
+class PicturePopup;
 class ViewBase;
 
 // The list row of one effect (component): disclosure triangle, on/off switch, title, and at the
@@ -106,7 +107,7 @@ class FilterItem : public EffectItem, public Commander {
   CheckBoxControl* GetSwitchCheckBox() const { return mSwitchCheckBox.get(); }
   PictureButton* GetSetupButton() const { return mSetupButton.get(); }
   PictureButton* GetResetButton() const { return mResetButton.get(); }
-  PictureButton* GetPresetPopup() const { return mPresetPopup.get(); }
+  PicturePopup* GetPresetPopup() const { return mPresetPopup.get(); }
   const ImageList& GetImageList() const { return *mImageList; }
 
   // The toggle as the switch does it; `modifiers` are the keys held (Alt asks the list to
@@ -123,6 +124,8 @@ class FilterItem : public EffectItem, public Commander {
   void Reset();
   void RunSetup();
   void ChoosePreset(int index);
+  // The popup shows the component's current preset (none when it has none).
+  void UpdatePresetSelection();
   void BroadcastToMonitor() const;
 
   MediaType mMediaType;
@@ -137,7 +140,7 @@ class FilterItem : public EffectItem, public Commander {
   bool mNoIndent = false;
   std::shared_ptr<MultiPictureButton> mSwitchButton;
   std::shared_ptr<CheckBoxControl> mSwitchCheckBox;
-  std::shared_ptr<PictureButton> mPresetPopup;
+  std::shared_ptr<PicturePopup> mPresetPopup;
   std::shared_ptr<PictureButton> mResetButton;
   std::shared_ptr<PictureButton> mSetupButton;
   std::unique_ptr<ImageList> mImageList;

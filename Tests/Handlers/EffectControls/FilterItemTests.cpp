@@ -25,6 +25,7 @@
 #include "Host/Toolkit/MenuTracker.h"
 #include "Host/Toolkit/MultiPictureButton.h"
 #include "Host/Toolkit/PictureButton.h"
+#include "Host/Toolkit/PicturePopup.h"
 #include "Host/Toolkit/ScriptedMenuTracker.h"
 #include "Host/Toolkit/SubView.h"
 #include "Host/Toolkit/ViewHost.h"
@@ -134,9 +135,11 @@ TEST_F(FilterItemTest, ThreePresetsGiveAPopupOfThreeItemsWithTheCurrentOneChecke
   row = MakeRow();
   EXPECT_EQ(row->GetResetButton(), nullptr);
   ASSERT_NE(row->GetPresetPopup(), nullptr);
+  EXPECT_EQ(row->GetPresetPopup()->GetItemCount(), 3);
+  EXPECT_EQ(row->GetPresetPopup()->GetSelectedIndex(), 1);
 
   menus->PushAnswer(std::nullopt);  // look, then dismiss
-  row->GetPresetPopup()->Click();
+  row->GetPresetPopup()->OpenMenu();
   ASSERT_EQ(menus->GetRequests().size(), 1u);
   const auto& entries = menus->GetRequests()[0].entries;
   ASSERT_EQ(entries.size(), 3u);
@@ -154,15 +157,19 @@ TEST_F(FilterItemTest, ChoosingAPresetTakesItsValuesAsOneUndoStep) {
   effect->SetPresets({{"Default", {}}, {"Soft", {{0, ParamValue(40.0)}}}, {"Strong", {}}});
   row = MakeRow();
   menus->PushAnswer(18601);
-  row->GetPresetPopup()->Click();
+  row->GetPresetPopup()->OpenMenu();
   EXPECT_EQ(effect->GetCurrentPreset(), 1);
+  EXPECT_EQ(row->GetPresetPopup()->GetSelectedIndex(), 1);
   EXPECT_EQ(radius->GetValueAt(0), ParamValue(40.0));
   EXPECT_EQ(UndoNames(), (std::vector<std::string>{ComponentActions::kApplyPreset}));
   EXPECT_EQ(Count(sequenceHeard, UpdateActiveProgramMonitorViewMessage::kTypeName), 1);
 
   ASSERT_TRUE(project->GetUndoStack().Undo());
   EXPECT_EQ(effect->GetCurrentPreset(), -1);
+  EXPECT_EQ(row->GetPresetPopup()->GetSelectedIndex(), -1);
   EXPECT_EQ(radius->GetValueAt(0), ParamValue(10.0));
+  ASSERT_TRUE(project->GetUndoStack().Redo());
+  EXPECT_EQ(row->GetPresetPopup()->GetSelectedIndex(), 1);
 }
 
 TEST_F(FilterItemTest, APresetCommandBeyondThePresetsChangesNothing) {
