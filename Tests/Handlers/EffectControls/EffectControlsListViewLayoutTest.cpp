@@ -321,3 +321,53 @@ TEST_F(ListLayoutTest, RendersABuiltListToPng) {
 }
 
 }  // namespace
+
+namespace {
+
+TEST_F(ListLayoutTest, TheTextExpanderIsMadeHiddenUnlessTheStyleLeavesItOut) {
+  Open();
+  ASSERT_NE(list->GetTextExpander(), nullptr);
+  EXPECT_FALSE(list->GetTextExpander()->IsVisible());
+  EXPECT_FALSE(list->IsTextExpanded());
+
+  list->Destroy();
+  host.reset();
+  list = std::make_shared<CountingListView>(nullptr, "EffectControlsTest.Styled");
+  list->SetStyle(kStyleNoXOTextExpander);
+  Open();
+  EXPECT_EQ(list->GetTextExpander(), nullptr);
+  EXPECT_NE(list->GetVideoExpander(), nullptr);
+}
+
+TEST_F(ListLayoutTest, TheWideNameStyleMovesASelectedParametersNameBand) {
+  const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Crop)});
+  Open({400, 200});
+  Select({clip});
+  const std::shared_ptr<EffectItem> param = list->GetVideoItems().At(0)->GetItems().front();
+  list->SelectParameter(param, true);
+  const Color selected = ColorManager::GetColor("colors.effectscontrols.listview.selected");
+  const int y = param->GetTop() + param->OwnHeight() - 4;
+  auto isSelected = [&](int x) {
+    return Packed(host->GetImage().GetPixel(x, y)) == Packed(selected);
+  };
+  host->InvalidateAll();
+  host->Render();
+  const int titleLeft = param->GetTitleLeft();
+  const int indent = param->GetParameterIndentInPixels();
+  // The name band runs from the title to 20 px before the middle.
+  EXPECT_FALSE(isSelected(12));
+  EXPECT_TRUE(isSelected(titleLeft + 1));
+  EXPECT_TRUE(isSelected(400 / 2 - 20 + indent - 1));
+  EXPECT_FALSE(isSelected(400 / 2 - 20 + indent + 1));
+
+  list->SetStyle(kStyleFlag2000);
+  host->InvalidateAll();
+  host->Render();
+  // From 10 px to three quarters of the width, less 30.
+  EXPECT_FALSE(isSelected(9));
+  EXPECT_TRUE(isSelected(11));
+  EXPECT_TRUE(isSelected(400 * 3 / 4 + indent - 30 - 1));
+  EXPECT_FALSE(isSelected(400 * 3 / 4 + indent - 30 + 1));
+}
+
+}  // namespace
