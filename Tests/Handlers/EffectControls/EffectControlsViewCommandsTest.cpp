@@ -2,12 +2,15 @@
 
 #include <memory>
 #include <optional>
+#include <string>
+#include <vector>
 
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessageLoop.h"
 #include "Host/Messaging/Preferences.h"
 #include "Host/Messaging/PropertyList.h"
@@ -445,6 +448,42 @@ TEST_F(PanelViewTest, AStackedPanelHasNoScrollBarAndTheListTakesItsPlace) {
   EXPECT_TRUE(view->GetScrollBar()->IsVisible());
   EXPECT_EQ(view->GetListView()->GetBounds().right, 800 - 4 - kS);
   EXPECT_EQ(view->GetMaxStackedHeight(), view->GetListView()->GetMaxHeight() + 60);
+}
+
+TEST_F(PanelViewTest, WhileAnAudioPartPlaysThePlayerIsRelayedAndTheEditLineComesBack) {
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 12 * kSec);
+  Open({800, 400});
+  sequence->SetSelection({clip});
+  sequence->SetCurrentTime(3 * kSec);
+  const std::string relay = "ECW.audio.player.relay";
+  RegisterStation(relay);
+  std::vector<TickTime> positions;
+  int stops = 0;
+  FunctionListener listener([&](const Message& message) {
+    if (const auto* position = message.As<AudioPlayerPositionChangedMessage>()) {
+      positions.push_back(position->time);
+    } else if (message.Is<AudioPlayerIsStoppedMessage>()) {
+      ++stops;
+    }
+  });
+  AddListener(relay, listener);
+
+  sequence->SetCurrentTime(4 * kSec);  // not playing a part: nothing relayed
+  EXPECT_TRUE(positions.empty());
+  BroadcastMessage(view->GetListView()->GetOwnStation(),
+                   EffectControlsAudioPartPlayStartedMessage(0));
+  sequence->SetCurrentTime(5 * kSec);
+  sequence->SetCurrentTime(6 * kSec);
+  EXPECT_EQ(positions, (std::vector<TickTime>{5 * kSec, 6 * kSec}));
+  EXPECT_EQ(view->GetTimeRuler()->GetCurrentTime(), 6 * kSec);
+  sequence->SetPlayerState(PlayerState::Playing);
+  sequence->SetPlayerState(PlayerState::Stopped);
+  EXPECT_EQ(stops, 1);
+  EXPECT_EQ(sequence->GetCurrentTime(), 4 * kSec);  // where it was before the part played
+  // A second stop without playback is not relayed.
+  sequence->SetPlayerState(PlayerState::Playing);
+  sequence->SetPlayerState(PlayerState::Stopped);
+  EXPECT_EQ(stops, 1);
 }
 
 }  // namespace
