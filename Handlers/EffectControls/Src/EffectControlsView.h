@@ -149,13 +149,17 @@ class EffectControlsView : public TabView,
   const std::shared_ptr<EffectControlsListView>& GetSharedListView() const { return mListView; }
 
   // --- Zoom and time range ---
-  // `secondsPerPixel` clamped by the limiter; `keepCurrentTime` keeps the edit line where it is
-  // on screen (left edge near 0 %, right edge near 100 %, else proportionally).
+  // `secondsPerPixel` clamped by the limiter. With `keepCurrentTime` and the edit line on screen:
+  // within the left 18 % the left edge stays, within the right 18 % the right edge stays, in
+  // between the edit line moves a third of the way toward the middle.
   void ZoomToTimePerPixel(double secondsPerPixel, bool keepCurrentTime);
   // The item's start and end in sequence ticks; a null item raises "Invalid TrackItem" and
   // gives {0, 0}.
   std::pair<TickTime, TickTime> GetTrackItemStartAndEnd(const TrackItemRef& trackItem) const;
-  // Sets the zoom limiter's and ruler's range for the selection (see the cpp).
+  // Sets the zoom limiter's and ruler's time range for the selection: a clip pinned, the span of
+  // the selected clips; unpinned, [0, sequence end]; a transition of duration d, from d before
+  // the outgoing clip to d after the incoming one (not below 0). Without a sequence it raises
+  // "Invalid TrackItemSelection" and changes nothing.
   void SetupTimeBarZoomMinMax(const std::vector<TrackItemGroup>& selection);
   // The sequence (or its settings) changed.
   void OnSequenceChanged(const SequenceRef& sequence, bool settingsChanged = false);
