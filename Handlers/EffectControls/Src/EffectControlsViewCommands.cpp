@@ -360,10 +360,15 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
     case kDeleteEffectCommand:
     case kResetEffectCommand:
     case kDeleteAllEffectsCommand:
+      // Effect commands are the list's (its effect commands are not built yet).
+      mListView->ObeyCommand(command);
+      return true;
     case kCommandClear:
-      // Effect commands are the list's (its effect commands and clipboard are not built yet).
-      return mListView->ObeyCommand(command) || command != kCommandClear ||
-             mKeyframeView->ObeyCommand(command);
+      // Selected effects first, else selected keyframes (neither is built yet).
+      if (!mListView->ObeyCommand(command)) {
+        mKeyframeView->ObeyCommand(command);
+      }
+      return true;
     case kCommandPaste:
       // Effects first; keyframes when the clipboard holds no effects.
       if (!mListView->ObeyCommand(command)) {

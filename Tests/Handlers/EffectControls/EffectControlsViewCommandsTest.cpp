@@ -10,20 +10,25 @@
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessageLoop.h"
 #include "Host/Messaging/Preferences.h"
 #include "Host/Messaging/PropertyList.h"
 #include "Host/Messaging/Station.h"
+#include "Host/Model/ComponentChain.h"
+#include "Host/Model/EffectCatalogue.h"
 #include "Host/Model/MarkerActions.h"
 #include "Host/Model/ModelMessages.h"
 #include "Host/Model/TrackItemGroup.h"
 #include "Host/Toolkit/CommandStatus.h"
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/HotTimecodeControl.h"
+#include "Host/Toolkit/InputBox.h"
 #include "Host/Toolkit/Menu.h"
 #include "Host/Toolkit/MenuRegistry.h"
 #include "Host/Toolkit/MenuTracker.h"
+#include "Host/Toolkit/ScriptedInputBox.h"
 #include "Host/Toolkit/ScriptedMenuTracker.h"
 #include "Host/Toolkit/StandardCommands.h"
 #include "Host/Toolkit/TimeBarControl.h"
@@ -484,6 +489,45 @@ TEST_F(PanelViewTest, WhileAnAudioPartPlaysThePlayerIsRelayedAndTheEditLineComes
   sequence->SetPlayerState(PlayerState::Playing);
   sequence->SetPlayerState(PlayerState::Stopped);
   EXPECT_EQ(stops, 1);
+}
+
+TEST_F(PanelViewTest, RenameAsksForTheNameOfTheOneSelectedEffectAndIsUndoable) {
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 7 * kSec);
+  const ComponentRef blur = EffectCatalogue::Standard().Create(kMatchName_GaussianBlur);
+  clip->GetComponentChain()->Append(blur);
+  Open({800, 400});
+  sequence->SetSelection({clip});
+  CommandStatus status;
+  view->FindCommandStatus(EffectControlsView::kRenameCommand, status);
+  EXPECT_FALSE(status.enabled);  // nothing selected
+
+  std::shared_ptr<EffectItem> row;
+  for (const auto& top : view->GetListView()->GetVideoItems()) {
+    const auto* filter = dynamic_cast<const FilterItem*>(top.get());
+    if (filter != nullptr && filter->Component() == blur) {
+      row = top;
+    }
+  }
+  ASSERT_NE(row, nullptr);
+  view->GetListView()->SelectItem(row, true);
+  view->FindCommandStatus(EffectControlsView::kRenameCommand, status);
+  EXPECT_TRUE(status.enabled);
+
+  auto answers = std::make_shared<ScriptedInputBox>();
+  answers->PushAnswer(std::string("Soft Focus"));
+  answers->PushAnswer(std::nullopt);  // the second box is cancelled
+  const auto previous = InputBox::SetResponder(answers);
+  view->ObeyCommand(EffectControlsView::kRenameCommand);
+  ASSERT_EQ(answers->GetRequests().size(), 1U);
+  EXPECT_EQ(answers->GetRequests().front().title, "Rename Item");
+  EXPECT_EQ(answers->GetRequests().front().prompt, "New Name");
+  EXPECT_EQ(blur->GetInstanceName(), "Soft Focus");
+  view->ObeyCommand(EffectControlsView::kRenameCommand);
+  EXPECT_EQ(answers->GetRequests().back().initialText, "Soft Focus");
+  EXPECT_EQ(blur->GetInstanceName(), "Soft Focus");
+  InputBox::SetResponder(previous);
+  ASSERT_TRUE(project->GetUndoStack().Undo());
+  EXPECT_NE(blur->GetInstanceName(), "Soft Focus");
 }
 
 }  // namespace
