@@ -72,6 +72,21 @@ void BM_SampleBezierCurve(benchmark::State& state) {
 }
 BENCHMARK(BM_SampleBezierCurve)->Arg(50)->Arg(5000);
 
+// As a value graph samples: the whole row of pixels in one call.
+void BM_SampleBezierCurveRow(benchmark::State& state) {
+  const KeyframeCurve curve = MakeCurve(static_cast<int>(state.range(0)));
+  const std::vector<TickTime> times = PixelTimes(curve);
+  std::vector<double> values(times.size());
+  for (auto _ : state) {
+    KeyframeCurve::Sampler sampler(curve);
+    sampler.ScalarsAt(times, values);
+    benchmark::DoNotOptimize(values.data());
+    benchmark::ClobberMemory();
+  }
+  state.SetItemsProcessed(state.iterations() * kPixels);
+}
+BENCHMARK(BM_SampleBezierCurveRow)->Arg(50)->Arg(5000);
+
 // Without the cursor: every pixel searches the keyframes from scratch.
 void BM_ValueAtWithoutSampler(benchmark::State& state) {
   const KeyframeCurve curve = MakeCurve(static_cast<int>(state.range(0)));

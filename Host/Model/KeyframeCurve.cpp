@@ -1010,6 +1010,52 @@ std::optional<double> KeyframeCurve::Sampler::ScalarAtSlowly(TickTime time) {
   return curve.mSegments[k].YAt(time, curve.mInverses[k]);
 }
 
+bool KeyframeCurve::Sampler::ScalarsAt(std::span<const TickTime> times, std::span<double> values) {
+  Sync();
+  if (!mScalarSegments || values.size() < times.size()) {
+    return false;
+  }
+  const KeyframeCurve& curve = *mCurve;
+  const TickTime* keyTimes = curve.mTimes.data();
+  const auto segments = static_cast<std::ptrdiff_t>(curve.mSegments.size());
+  const std::size_t count = times.size();
+  std::size_t i = 0;
+  while (i < count) {
+    std::ptrdiff_t k = Locate(times[i], Approach::FromRight);
+    if (k < 0 || k >= segments) {
+      values[i] = *ScalarAtSlowly(times[i]);
+      ++i;
+      continue;
+    }
+    // Walk forward while the times keep within the next few segments; anything else (a jump, a
+    // step back, past the last keyframe) is located afresh.
+    for (;;) {
+      const CurveSegment& record = curve.mSegments[static_cast<std::size_t>(k)];
+      const CurveInverse& inverse = curve.mInverses[static_cast<std::size_t>(k)];
+      const TickTime start = keyTimes[k];
+      const TickTime end = keyTimes[k + 1];
+      do {
+        values[i] = record.YInside(times[i], inverse);
+        ++i;
+      } while (i < count && times[i] >= start && times[i] < end);
+      if (i == count || times[i] < end) {
+        break;
+      }
+      std::ptrdiff_t next = k + 1;
+      const auto farthest = k + static_cast<std::ptrdiff_t>(kCursorSteps);
+      while (next < segments && next < farthest && keyTimes[next + 1] <= times[i]) {
+        ++next;
+      }
+      if (next >= segments || keyTimes[next + 1] <= times[i]) {
+        break;
+      }
+      k = next;
+    }
+    mSegment = static_cast<std::size_t>(k);
+  }
+  return true;
+}
+
 double KeyframeCurve::Sampler::VelocityAt(TickTime time, Approach approach) {
   const KeyframeCurve& curve = *mCurve;
   const std::ptrdiff_t segment = Locate(time, approach);

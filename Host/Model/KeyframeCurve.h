@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <span>
 #include <vector>
 
 #include "Host/Model/CurvePath.h"
@@ -182,6 +183,11 @@ class KeyframeCurve::Sampler {
   std::optional<ParamValue> ValueAt(TickTime time);
   std::optional<double> ScalarAt(TickTime time);
   double VelocityAt(TickTime time, Approach approach = Approach::FromRight);
+  // ScalarAt for many times at once, as a graph samples a row of pixels: values[i] is the
+  // reading at times[i] (values holds at least as many as times). The segment is found once per
+  // run of times that lie in it, which is where a graph's work goes. False, with the values
+  // untouched, when the curve has no scalar reading (empty, points, colours, text, blobs).
+  bool ScalarsAt(std::span<const TickTime> times, std::span<double> values);
 
  private:
   // The segment for `time`, or -1 before the first keyframe, Size() - 1 at or after the last.

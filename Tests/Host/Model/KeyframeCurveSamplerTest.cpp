@@ -51,6 +51,59 @@ TEST(KeyframeCurveSampler, AgreesWithTheCurveForwardBackwardAndAtRandom) {
   }
 }
 
+// A row of readings at once gives exactly what one reading at a time gives, whatever the order
+// of the times and however many keyframes lie between them.
+void ExpectRowAgrees(const KeyframeCurve& curve, const std::vector<TickTime>& times) {
+  KeyframeCurve::Sampler sampler(curve);
+  std::vector<double> values(times.size(), -12345.0);
+  ASSERT_TRUE(sampler.ScalarsAt(times, values));
+  for (std::size_t i = 0; i < times.size(); ++i) {
+    ASSERT_EQ(values[i], curve.ScalarAt(times[i])) << i << " at " << times[i];
+  }
+}
+
+TEST(KeyframeCurveSampler, ARowOfReadingsMatchesReadingsOneByOne) {
+  Random random(11);
+  for (const int count : {1, 2, 9, 300, 2000}) {
+    const KeyframeCurve curve = RandomCurve(random, count);
+    // From before the first keyframe to after the last, sparse and dense, on the keyframes too.
+    for (const int samples : {7, 150, 4000}) {
+      std::vector<TickTime> times = Times(-kSecond, (count + 1) * kSecond, samples);
+      for (const Keyframe& key : curve.Keyframes()) {
+        times.push_back(key.time);
+      }
+      std::sort(times.begin(), times.end());
+      ExpectRowAgrees(curve, times);
+      std::reverse(times.begin(), times.end());
+      ExpectRowAgrees(curve, times);
+      for (std::size_t i = 0; i < times.size(); ++i) {
+        std::swap(times[i],
+                  times[static_cast<std::size_t>(random.Below(static_cast<int>(times.size())))]);
+      }
+      ExpectRowAgrees(curve, times);
+    }
+  }
+}
+
+TEST(KeyframeCurveSampler, ARowIsRefusedWithoutScalarsOrRoomForThem) {
+  KeyframeCurve empty;
+  std::vector<double> values(2, 7.0);
+  const std::vector<TickTime> times{0, kSecond};
+  EXPECT_FALSE(KeyframeCurve::Sampler(empty).ScalarsAt(times, values));
+  KeyframeCurve points;
+  points.Add(Key(0, ParamPoint{1, 2}));
+  points.Add(Key(kSecond, ParamPoint{3, 4}));
+  EXPECT_FALSE(KeyframeCurve::Sampler(points).ScalarsAt(times, values));
+  KeyframeCurve scalars;
+  scalars.Add(Key(0, 1.0));
+  std::vector<double> tooFew(1, 7.0);
+  EXPECT_FALSE(KeyframeCurve::Sampler(scalars).ScalarsAt(times, tooFew));
+  EXPECT_EQ(tooFew[0], 7.0);
+  EXPECT_EQ(values, (std::vector<double>{7.0, 7.0}));
+  EXPECT_TRUE(KeyframeCurve::Sampler(scalars).ScalarsAt(times, values));
+  EXPECT_EQ(values, (std::vector<double>{1.0, 1.0}));
+}
+
 TEST(KeyframeCurveSampler, CoarseStepsAcrossManyKeyframes) {
   Random random(8);
   const KeyframeCurve curve = RandomCurve(random, 2000);
