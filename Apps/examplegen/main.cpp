@@ -97,17 +97,17 @@ void Keyframes(const ComponentParamRef& param,
   param->ApplyState(std::move(state));
 }
 
-ComponentRef GraphicsLayer(Builder& b, const std::string& name) {
+ComponentRef GraphicsLayer(Builder& b, const std::string& name, const std::string& text,
+                           ParamPoint position, ParamColor fill) {
   auto layer = Component::Create("XO.KRVN GraphicsLayer", name, MediaType::Video, false);
   layer->SetRole(ComponentRole::Graphics);
-  layer->AddParam(ComponentParam::Create("Source Text", ParamType::Text, std::string("Headline"))
-                      ->SetCanVaryOverTime(false));
-  layer->AddParam(ComponentParam::Create("Position", ParamType::Point, ParamPoint{960.0, 900.0}));
+  layer->AddParam(
+      ComponentParam::Create("Source Text", ParamType::Text, text)->SetCanVaryOverTime(false));
+  layer->AddParam(ComponentParam::Create("Position", ParamType::Point, position));
   layer->AddParam(ComponentParam::Create("Opacity", ParamType::FloatSlider, 100.0)
                       ->SetRange(0.0, 100.0)
                       ->SetUnits(ParamUnits::Percent));
-  layer->AddParam(
-      ComponentParam::Create("Fill Color", ParamType::Color, ParamColor{1.0f, 0.85f, 0.2f, 1.0f}));
+  layer->AddParam(ComponentParam::Create("Fill Color", ParamType::Color, fill));
   return b.Number(layer);
 }
 
@@ -187,8 +187,10 @@ ProjectRef BuildDemo() {
   auto graphic = b.Clip(v2, title, Seconds(1), Seconds(6), 0, 0);
   graphic->SetIntroDuration(Seconds(1));
   graphic->SetOutroDuration(Seconds(1));
-  graphic->GetComponentChain()->Append(GraphicsLayer(b, "Headline"));
-  graphic->GetComponentChain()->Append(GraphicsLayer(b, "Subtitle"));
+  graphic->GetComponentChain()->Append(
+      GraphicsLayer(b, "Headline", "Beach Day", {960.0, 880.0}, {1.0f, 0.85f, 0.2f, 1.0f}));
+  graphic->GetComponentChain()->Append(GraphicsLayer(b, "Subtitle", "Summer on the coast",
+                                                     {960.0, 950.0}, {1.0f, 1.0f, 1.0f, 1.0f}));
 
   Markers markers;
   markers.Add({Seconds(4), 0, "Cut here?", "", 1});
