@@ -1,4 +1,5 @@
 #include <algorithm>
+#include <optional>
 
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
@@ -16,6 +17,30 @@
 #include "Host/Toolkit/ShortcutManager.h"
 #include "Host/Toolkit/StandardCommands.h"
 #include "Host/Toolkit/TimeBarControl.h"
+
+namespace {
+
+// The snapping option a snapping command toggles.
+std::optional<EffectControlsKeyframeView::SnapFlag> SnapFlagFor(CommandID command) {
+  switch (command) {
+    case EffectControlsView::kToggleSnappingCommand:
+      return EffectControlsKeyframeView::kSnapKeyframes;
+    case EffectControlsView::kSnapToVideoCommand:
+      return EffectControlsKeyframeView::kSnapVideo;
+    case EffectControlsView::kSnapToAudioCommand:
+      return EffectControlsKeyframeView::kSnapAudio;
+    case EffectControlsView::kSnapToMarkersCommand:
+      return EffectControlsKeyframeView::kSnapMarkers;
+    case EffectControlsView::kSnapToCurrentTimeCommand:
+      return EffectControlsKeyframeView::kSnapCurrentTime;
+    case EffectControlsView::kSnapToClipCommand:
+      return EffectControlsKeyframeView::kSnapClip;
+    default:
+      return std::nullopt;
+  }
+}
+
+}  // namespace
 
 bool EffectControlsView::IsNavigationCommand(CommandID command) const {
   switch (command) {
@@ -169,11 +194,11 @@ bool EffectControlsView::IsEditingCommand(CommandID command) const {
 bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& status) {
   status = CommandStatus{};
   const bool editable = CanEdit();
-  const auto snap = [&](EffectControlsKeyframeView::SnapFlag flag) {
+  if (const auto flag = SnapFlagFor(command)) {
     status.enabled = true;
-    status.checked = mKeyframeView->IsSnapFlagSet(flag);
+    status.checked = mKeyframeView->IsSnapFlagSet(*flag);
     return true;
-  };
+  }
   switch (command) {
     case kToggleKeyframesCommand:
       status.enabled = true;
@@ -202,18 +227,6 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
     case kZoomOutCommand:
       status.enabled = mTargetMode != kTargetNone && mKeyframesVisible;
       return true;
-    case kToggleSnappingCommand:
-      return snap(EffectControlsKeyframeView::kSnapKeyframes);
-    case kSnapToVideoCommand:
-      return snap(EffectControlsKeyframeView::kSnapVideo);
-    case kSnapToAudioCommand:
-      return snap(EffectControlsKeyframeView::kSnapAudio);
-    case kSnapToMarkersCommand:
-      return snap(EffectControlsKeyframeView::kSnapMarkers);
-    case kSnapToCurrentTimeCommand:
-      return snap(EffectControlsKeyframeView::kSnapCurrentTime);
-    case kSnapToClipCommand:
-      return snap(EffectControlsKeyframeView::kSnapClip);
     case kSnapToAllCommand:
     case kSnapToNoneCommand:
       status.enabled = true;
@@ -282,10 +295,10 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
     // A read-only container takes editing commands and does nothing.
     return true;
   }
-  const auto snap = [this](EffectControlsKeyframeView::SnapFlag flag) {
-    mKeyframeView->ToggleSnapFlag(flag);
+  if (const auto flag = SnapFlagFor(command)) {
+    mKeyframeView->ToggleSnapFlag(*flag);
     return true;
-  };
+  }
   switch (command) {
     case kToggleKeyframesCommand:
       ToggleKeyframesVisible();
@@ -330,18 +343,6 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
         mListView->ObeyCommand(EffectControlsListView::kPlayAudioPartCommand);
       }
       return true;
-    case kToggleSnappingCommand:
-      return snap(EffectControlsKeyframeView::kSnapKeyframes);
-    case kSnapToVideoCommand:
-      return snap(EffectControlsKeyframeView::kSnapVideo);
-    case kSnapToAudioCommand:
-      return snap(EffectControlsKeyframeView::kSnapAudio);
-    case kSnapToMarkersCommand:
-      return snap(EffectControlsKeyframeView::kSnapMarkers);
-    case kSnapToCurrentTimeCommand:
-      return snap(EffectControlsKeyframeView::kSnapCurrentTime);
-    case kSnapToClipCommand:
-      return snap(EffectControlsKeyframeView::kSnapClip);
     case kSnapToAllCommand:
       mKeyframeView->SetSnapFlags(mKeyframeView->GetSnapFlags() |
                                   EffectControlsKeyframeView::kSnapTargets);
