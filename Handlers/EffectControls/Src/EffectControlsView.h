@@ -59,7 +59,6 @@ class EffectControlsView : public TabView,
   static constexpr int kSeparatorGap = 4;
   static constexpr int kBottomBarHeight = 20;
   static constexpr int kScrollStep = 20;
-  static constexpr double kTicksPerSecond = 254016000000.0;
   static constexpr int kMaxScrollRange = 2147483646;
   // The ruler: the toolkit's small time bar plus 4 px, with the zoom bar above it.
   static constexpr int kZoomBarHeight = 10;
