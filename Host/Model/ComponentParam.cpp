@@ -4,6 +4,7 @@
 #include <cmath>
 #include <utility>
 
+#include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentChain.h"
 #include "Host/Model/ModelMessages.h"
@@ -37,7 +38,8 @@ ComponentParam::ComponentParam(std::string name, ParamType type, ParamValue defa
       mName(std::move(name)),
       mType(type),
       mDefault(std::move(defaultValue)),
-      mCanVary(VariesByDefault(type)) {
+      mCanVary(VariesByDefault(type)),
+      mAudioGain(type == ParamType::AudioGain && KindOf(mDefault) == ParamValueKind::Double) {
   mState.value = mDefault;
 }
 
@@ -58,6 +60,7 @@ ComponentParamRef ComponentParam::Clone() const {
   copy->mMenuEntries = mMenuEntries;
   copy->mDisablesWhenOn = mDisablesWhenOn;
   copy->mCanVary = mCanVary;
+  copy->mAudioGain = mAudioGain;
   copy->mVisible = mVisible;
   copy->mEnabled = mEnabled;
   copy->mReadOnly = mReadOnly;
@@ -153,6 +156,13 @@ ComponentParamRef ComponentParam::SetDisablesWhenOn(std::vector<std::string> nam
 
 ComponentParamRef ComponentParam::SetCanVaryOverTime(bool can) {
   mCanVary = can;
+  return ComponentParamRef(this);
+}
+
+ComponentParamRef ComponentParam::SetAudioGain(bool gain) {
+  if (!gain || HOST_VERIFY(GetValueKind() == ParamValueKind::Double, "A gain must be a number")) {
+    mAudioGain = gain;
+  }
   return ComponentParamRef(this);
 }
 

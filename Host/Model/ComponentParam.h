@@ -76,6 +76,11 @@ class ComponentParam : public ModelObject {
   ComponentParamRef SetGroupKind(GroupKind kind);
   ComponentParamRef SetMenuEntries(std::vector<std::string> entries);
   ComponentParamRef SetCanVaryOverTime(bool can);
+  // A gain: the value is linear (1.0 leaves the level as it is, 0 silences) and is presented and
+  // dragged in decibels. Only number parameters can be gains; others keep false. Parameters
+  // made with the old gain type code (17) are gains.
+  ComponentParamRef SetAudioGain(bool gain);
+  bool IsAudioGain() const { return mAudioGain; }
   // A check box that, while on, disables the named parameters of its component (and enables
   // them while off); kept up on every change, undo and redo included.
   ComponentParamRef SetDisablesWhenOn(std::vector<std::string> names);
@@ -145,6 +150,7 @@ class ComponentParam : public ModelObject {
   std::vector<std::string> mMenuEntries;
   std::vector<std::string> mDisablesWhenOn;
   bool mCanVary = true;
+  bool mAudioGain = false;
   bool mVisible = true;
   bool mEnabled = true;
   bool mReadOnly = false;

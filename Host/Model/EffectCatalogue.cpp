@@ -1,5 +1,6 @@
 #include "Host/Model/EffectCatalogue.h"
 
+#include <cmath>
 #include <utility>
 
 #include "Host/Model/ComponentParam.h"
@@ -103,9 +104,11 @@ ComponentRef TimeRemapping() {
 }
 
 ComponentParamRef Gain(const char* name) {
-  // Linear gain; 5.6234 is +15 dB.
-  return Scalar(name, 1.0, 0.0, 5.6234, 1, ParamUnits::Decibels, ParamType::AudioGain)
-      ->SetStep(0.01);
+  // Linear, from silence to the headroom; presented in dB.
+  const double headroom = std::pow(10.0, AudioFilterParamInfo::kGainHeadroomDecibels / 20.0);
+  return Scalar(name, 1.0, 0.0, headroom, 1, ParamUnits::Decibels)
+      ->SetStep(0.01)
+      ->SetAudioGain(true);
 }
 
 ComponentRef Volume() {
@@ -209,7 +212,24 @@ ComponentRef Delay() {
   effect->AddParam(Scalar("Delay", 1.0, 0.0, 2.0, 3, ParamUnits::Seconds)->SetStep(0.001));
   effect->AddParam(Scalar("Feedback", 0.0, 0.0, 100.0, 1, ParamUnits::Percent));
   effect->AddParam(Scalar("Mix", 50.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  // The plug-in's own state, which it restores itself and never shows.
+  effect->AddParam(ComponentParam::Create("Plug-in State", ParamType::Opaque, ParamBlob{})
+                       ->SetCanVaryOverTime(false));
   return effect;
+}
+
+void DescribeAudioParams(EffectCatalogue& catalogue) {
+  AudioParamDescription delay;
+  delay.display.displayMode = AudioFilterParamInfo::kDisplayModeFine;
+  delay.display.minimum = 0.0f;
+  delay.display.maximum = 2.0f;
+  delay.display.increment = 0.001f;
+  delay.unitText = " s";
+  catalogue.DescribeAudioParam(kMatchName_Delay, "Delay", delay);
+
+  AudioParamDescription hidden;
+  hidden.shown = false;
+  catalogue.DescribeAudioParam(kMatchName_Delay, "Plug-in State", hidden);
 }
 
 ComponentRef Mask() {
@@ -241,6 +261,7 @@ EffectCatalogue MakeStandard() {
         BrightnessContrast(), Crop(), Tint(), Timecode(), GridDistortion(), Delay(), Mask()}) {
     catalogue.Register(std::move(effect));
   }
+  DescribeAudioParams(catalogue);
   return catalogue;
 }
 
@@ -298,4 +319,26 @@ std::vector<ComponentRef> EffectCatalogue::CreateIntrinsics(MediaType mediaType)
     }
   }
   return intrinsics;
+}
+
+void EffectCatalogue::DescribeAudioParam(std::string_view matchName, std::string_view paramName,
+                                         AudioParamDescription description) {
+  for (AudioParamEntry& entry : mAudioParams) {
+    if (entry.matchName == matchName && entry.paramName == paramName) {
+      entry.description = std::move(description);
+      return;
+    }
+  }
+  mAudioParams.push_back(
+      AudioParamEntry{std::string(matchName), std::string(paramName), std::move(description)});
+}
+
+const AudioParamDescription* EffectCatalogue::FindAudioParamDescription(
+    std::string_view matchName, std::string_view paramName) const {
+  for (const AudioParamEntry& entry : mAudioParams) {
+    if (entry.matchName == matchName && entry.paramName == paramName) {
+      return &entry.description;
+    }
+  }
+  return nullptr;
 }

@@ -4,6 +4,7 @@
 #include <string_view>
 #include <vector>
 
+#include "Host/Model/AudioFilterParamInfo.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
@@ -48,6 +49,21 @@ class EffectCatalogue {
   // Fresh copies of the intrinsics every clip of the media type carries, in chain order.
   std::vector<ComponentRef> CreateIntrinsics(MediaType mediaType) const;
 
+  // How an audio effect presents its parameter `paramName` where that differs from what the
+  // parameter implies by itself (AudioFilterParamInfo::Describe); replaces an earlier one.
+  void DescribeAudioParam(std::string_view matchName, std::string_view paramName,
+                          AudioParamDescription description);
+  // nullptr when the effect gives no description of its own for the parameter.
+  const AudioParamDescription* FindAudioParamDescription(std::string_view matchName,
+                                                         std::string_view paramName) const;
+
  private:
+  struct AudioParamEntry {
+    std::string matchName;
+    std::string paramName;
+    AudioParamDescription description;
+  };
+
   std::vector<ComponentRef> mTemplates;
+  std::vector<AudioParamEntry> mAudioParams;
 };

@@ -170,7 +170,7 @@ void KeyframeMultiSelectionActor::Apply(TickTime timeDelta, double valueDelta) {
       for (TickTime time : moved) {
         const std::size_t index = *state.keyframes.FindAt(time);
         const double current = std::get<double>(state.keyframes.At(index).value);
-        const double value = mScaleDB && entry.param->GetType() == ParamType::AudioGain
+        const double value = mScaleDB && entry.param->IsAudioGain()
                                  ? current * std::pow(10.0, valueDelta / 20.0)
                                  : current + valueDelta;
         if (auto accepted = entry.param->Coerce(ParamValue(value))) {

@@ -130,6 +130,7 @@ json SaveParam(const ComponentParam& p) {
           {"step", p.GetStep()},
           {"menu", p.GetMenuEntries()},
           {"canVary", p.CanVaryOverTime()},
+          {"audioGain", p.IsAudioGain()},
           {"disablesWhenOn", p.GetDisablesWhenOn()},
           {"visible", p.IsVisible()},
           {"enabled", p.IsEnabled()},
@@ -851,7 +852,12 @@ class Loader {
 
   ComponentParamRef LoadParam(const Node& node) {
     const auto typeNode = node.Member("type");
-    const auto type = static_cast<ParamType>(typeNode.IntIn(0, 1000));
+    auto type = static_cast<ParamType>(typeNode.IntIn(0, 1000));
+    // Older files typed gains apart; today a gain is a number parameter with the gain flag.
+    const bool oldGainType = type == ParamType::AudioGain;
+    if (oldGainType) {
+      type = ParamType::FloatSlider;
+    }
     auto param = ComponentParam::Create(node.Member("name").String(), type,
                                         LoadValue(node.Member("default")));
     mIds.Claim(node, *param);
@@ -890,6 +896,13 @@ class Loader {
       param->SetMenuEntries(std::move(entries));
     }
     param->SetCanVaryOverTime(node.Bool("canVary", true));
+    if (node.Bool("audioGain", oldGainType)) {
+      if (param->GetValueKind() != ParamValueKind::Double) {
+        (node.Has("audioGain") ? node.Member("audioGain") : typeNode)
+            .Fail("a gain must be a number");
+      }
+      param->SetAudioGain(true);
+    }
     if (node.Has("disablesWhenOn")) {
       std::vector<std::string> names;
       for (const auto& e : node.Member("disablesWhenOn").Elements())

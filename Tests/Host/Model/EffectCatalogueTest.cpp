@@ -22,8 +22,8 @@ TEST_F(EffectCatalogueTest, TheTemplatesCoverTheParameterTypesTheListPresents) {
        {ParamType::Slider, ParamType::FloatSlider, ParamType::Angle, ParamType::Checkbox,
         ParamType::Color, ParamType::Point, ParamType::Menu, ParamType::DoubleSlider,
         ParamType::Custom, ParamType::GroupBegin, ParamType::GroupEnd, ParamType::Timecode,
-        ParamType::Button, ParamType::AudioGain, ParamType::TimeRemapping, ParamType::Opaque,
-        ParamType::Text, ParamType::Info}) {
+        ParamType::Button, ParamType::TimeRemapping, ParamType::Opaque, ParamType::Text,
+        ParamType::Info}) {
     EXPECT_TRUE(types.contains(type)) << static_cast<int>(type);
   }
 }
