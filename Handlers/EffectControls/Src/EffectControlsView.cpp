@@ -120,6 +120,8 @@ void EffectControlsView::CreateChildrenSelf() {
       Rect::FromSize(5, bounds.Height() - 20, 105, 20),
       mSequence ? mSequence->GetVideoTimeDisplay() : kFrameRate_25, 0, this);
   mTimecode->SetTakesFocusOnClick(false);
+  // The edit line never goes before the sequence's start, however far it is scrubbed or typed.
+  mTimecode->SetMinTime(0);
   AddChild(mTimecode);
   AddListener(mTimecode->GetStation(), *this);
 
