@@ -1,5 +1,6 @@
 // Building the rows of the effect list from its target, and tearing them down.
 #include <algorithm>
+#include <cstdint>
 #include <string_view>
 #include <utility>
 
@@ -11,6 +12,7 @@
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/Station.h"
+#include "Host/Model/AudioFilterParamInfo.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentChain.h"
 #include "Host/Model/ComponentParam.h"
@@ -655,8 +657,15 @@ void EffectControlsListView::LoadFilterParameterControls(
   if (!parentRow || !component || !param) {
     return;
   }
-  // Audio effects describe no hidden parameters to this host; other effects ask the hook.
-  if (component->GetMediaType() != MediaType::Audio && !ShouldAllowParameter(component, param)) {
+  // An audio effect says itself which of its parameters it shows; other effects ask the hook.
+  if (component->GetMediaType() == MediaType::Audio) {
+    const auto audioInfo = AudioFilterParamInfo::ForComponent(*component);
+    const std::size_t index = component->GetParamIndex(param.get());
+    if (!audioInfo || index == 0 ||
+        !audioInfo->IsParamShown(static_cast<std::uint32_t>(index - 1))) {
+      return;
+    }
+  } else if (!ShouldAllowParameter(component, param)) {
     return;
   }
   ParameterRowRequest request;

@@ -6,6 +6,7 @@
 #include <typeinfo>
 #include <utility>
 
+#include "Handlers/EffectControls/Src/AudioFloatSliderParameter.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/Component.h"
@@ -117,17 +118,26 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
     return {};
   }
   const bool ownSliderRows = (request.listStyle & kOwnSliderRowsStyle) != 0;
-  const bool video = info.component && info.component->GetMediaType() == MediaType::Video;
+  const bool audio = info.component && info.component->GetMediaType() == MediaType::Audio;
 
   std::vector<std::shared_ptr<ParameterControl>> rows;
   switch (info.param->GetType()) {
     case ParamType::Slider:
       rows.push_back(std::make_shared<SliderParameter>(info));
       break;
+    case ParamType::AudioGain:
+      // Gains made in code with the old type code; a gain means nothing to a video effect.
+      if (audio) {
+        rows.push_back(std::make_shared<AudioFloatSliderParameter>(info));
+      }
+      break;
     case ParamType::FloatSlider:
-      rows.push_back(HostRowStandIn<FloatSliderParameter>(
-          video ? "VideoFloatSliderParameter" : "AudioFloatSliderParameter", "FloatSliderParameter",
-          info));
+      if (audio) {
+        rows.push_back(std::make_shared<AudioFloatSliderParameter>(info));
+      } else {
+        rows.push_back(HostRowStandIn<FloatSliderParameter>("VideoFloatSliderParameter",
+                                                            "FloatSliderParameter", info));
+      }
       break;
     case ParamType::Angle:
       if (ownSliderRows) {
@@ -195,8 +205,7 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
       break;
     case ParamType::GroupBegin:
     case ParamType::GroupEnd:
-    case ParamType::AudioGain:
-      break;  // groups have rows of their own; the others have no row
+      break;  // groups have rows of their own
   }
   return rows;
 }
