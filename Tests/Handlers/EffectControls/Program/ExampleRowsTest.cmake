@@ -12,6 +12,9 @@ cmake_minimum_required(VERSION 3.25)
 # Parameter types the list makes a row for; other types get none.
 set(row_types 1 2 3 4 5 6 7 8 9 13 14 16 21 22 23 24 25)
 
+# Parameters an audio effect's description hides ("match name>parameter name"): no row.
+set(hidden_audio_params "XO.KRVN Delay>Plug-in State")
+
 # Intrinsic graphics groups go to the graphics section even though they are intrinsic.
 set(graphic_group_match "XO.KRVN GraphicGroup")
 
@@ -394,6 +397,14 @@ foreach(project_file IN LISTS projects)
         string(JSON type GET "${component}" params ${p} type)
         string(JSON param_name GET "${component}" params ${p} name)
         if(NOT type IN_LIST row_types)
+          continue()
+        endif()
+        string(JSON match_name GET "${component}" matchName)
+        if("${match_name}>${param_name}" IN_LIST hidden_audio_params)
+          if("${title}>${param_name}" IN_LIST all_paths)
+            message(FATAL_ERROR "${project_name}: selecting ${id} shows a row for the parameter "
+                                "'${param_name}' that '${title}' hides")
+          endif()
           continue()
         endif()
         if(NOT "${title}>${param_name}" IN_LIST all_paths)
