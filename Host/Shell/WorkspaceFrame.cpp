@@ -17,6 +17,8 @@ constexpr Color kBackTextColor(150, 150, 150);
 constexpr Color kAccentColor(70, 130, 220);
 constexpr int kLabelPadding = 12;
 constexpr int kMaxLabelWidth = 220;
+constexpr int kFlyoutButtonWidth = 22;
+constexpr Color kFlyoutGlyphColor(190, 190, 190);
 
 }  // namespace
 
@@ -109,6 +111,14 @@ Rect WorkspaceFrame::GetTabArea() const {
   return {0, std::min(kTabStripHeight, size.height), size.width, size.height};
 }
 
+Rect WorkspaceFrame::GetFlyoutButtonRect() const {
+  const TabView* front = GetFrontTab();
+  if (front == nullptr || front->GetFlyoutMenuName().empty())
+    return {};
+  const int width = GetBounds().Width();
+  return {std::max(0, width - kFlyoutButtonWidth), 0, width, kTabStripHeight};
+}
+
 void WorkspaceFrame::TabsChanged() {
   Prune();
   if (GetFrontTab() == nullptr) {
@@ -142,9 +152,25 @@ void WorkspaceFrame::PaintSelf(DC& dc) {
     dc.DrawText(LocalizeString(tabs[i]->GetTabName()), label.Inset(kLabelPadding, 0), font,
                 isFront ? kFrontTextColor : kBackTextColor, TextAlign::kLeft, TextVAlign::kCenter);
   }
+  // Three short bars: the flyout menu button.
+  const Rect button = GetFlyoutButtonRect();
+  if (!button.IsEmpty()) {
+    const int left = button.left + (button.Width() - 10) / 2;
+    const int top = button.top + (button.Height() - 7) / 2;
+    for (int bar = 0; bar < 3; ++bar)
+      dc.FillRect({left, top + 3 * bar, left + 10, top + 3 * bar + 1}, kFlyoutGlyphColor);
+  }
 }
 
 void WorkspaceFrame::LeftButtonDownSelf(Point point, KeyModifiers /*modifiers*/) {
+  if (const Rect button = GetFlyoutButtonRect(); button.Contains(point)) {
+    TabView* front = GetFrontTab();
+    // The menu opens under the button, in the tab's coordinates; the tab may go while it runs.
+    const std::shared_ptr<ViewBase> keep = front->shared_from_this();
+    const Point below = LocalToWindow(Point{button.left, button.bottom});
+    front->TrackPopupMenu(front->GetFlyoutMenuName(), front->WindowToLocal(below));
+    return;
+  }
   const auto tabs = GetTabs();
   for (std::size_t i = 0; i < tabs.size(); ++i) {
     if (GetTabLabelRect(i).Contains(point)) {
