@@ -121,6 +121,14 @@ int AudioFloatSliderParameter::GetHotTextPaddingWidth() const {
   return length <= 2 ? 4 : 30;
 }
 
+std::string AudioFloatSliderParameter::GetValueText(double value) const {
+  if (mDisplayInfo.displayMode == AudioFilterParamInfo::kDisplayModeFader &&
+      value <= mDisplayInfo.minimum) {
+    return kMinusInfinityText;
+  }
+  return FloatSliderParameter::GetValueText(value);
+}
+
 std::string AudioFloatSliderParameter::GetUnitText() const {
   return mAudioInfo->GetUnitText(mParamIndex);
 }

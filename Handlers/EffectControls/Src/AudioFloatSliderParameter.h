@@ -42,6 +42,8 @@ class AudioFloatSliderParameter : public FloatSliderParameter {
   // The unit text the effect gives the parameter ("" for none).
   std::string GetUnitText() const;
   std::string GetSuffixText() const override { return GetUnitText(); }
+  // The bottom of a fader reads minus infinity.
+  std::string GetValueText(double value) const override;
 
  protected:
   // The stored value at the edit time, mapped for display when the description says so.

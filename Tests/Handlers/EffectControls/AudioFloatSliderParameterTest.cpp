@@ -21,6 +21,7 @@
 #include "Host/Model/UndoStack.h"
 #include "Host/Toolkit/FloatSliderControl.h"
 #include "Host/Toolkit/HotFloatControl.h"
+#include "Host/Toolkit/Static.h"
 #include "Host/Toolkit/SubView.h"
 #include "Host/Toolkit/ViewHost.h"
 #include "Tests/Handlers/EffectControls/EffectControlsListViewTestSupport.h"
@@ -121,6 +122,15 @@ TEST_F(AudioSliderRowTest, SilenceShowsAsMinusInfinity) {
   auto row = MakeRow(volume, "Level");
   EXPECT_EQ(row->GetHotText()->GetDisplayText(), kMinusInfinity);
   EXPECT_DOUBLE_EQ(row->GetHotText()->GetValue(), -96.0);
+}
+
+TEST_F(AudioSliderRowTest, AsTextAGainReadsInDecibelsToo) {
+  auto row = MakeRow(volume, "Level");
+  row->SetShowValueAsText(true);
+  ASSERT_NE(row->GetValueLabel(), nullptr);
+  EXPECT_EQ(row->GetValueLabel()->GetText(), "0.0 dB");
+  ComponentParamActions::SetValue(volume->FindParam("Level"), 7 * kSec, 0.0);
+  EXPECT_EQ(row->GetValueLabel()->GetText(), kMinusInfinity + " dB");
 }
 
 TEST_F(AudioSliderRowTest, ATypedDecibelValueIsOneUndoStepStoredLinear) {
