@@ -58,18 +58,15 @@ void AudioFloatSliderParameter::RefreshSliderParameters() {
   mMinimum = display.minimum;
   mMaximum = display.maximum;
   mValueIncrement = display.increment;
-  double sliderExponent = 1.0;
   switch (display.displayMode) {
     case AudioFilterParamInfo::kDisplayModeFader:
       mExponential = true;
-      mExponent = kFaderFieldExponent;
-      sliderExponent = kFaderSliderExponent;
+      mExponent = kFaderExponent;
       break;
     case AudioFilterParamInfo::kDisplayModeFrequency:
       mExponential = true;
       mExponent = kFrequencyExponent;
       mValueIncrement = 0.1;
-      sliderExponent = kFrequencyExponent;
       break;
     default:
       mExponential = false;
@@ -99,7 +96,7 @@ void AudioFloatSliderParameter::RefreshSliderParameters() {
   if (FloatSliderControl* slider = GetSlider()) {
     slider->SetMaxValue(display.maximum);
     slider->SetMinValue(display.minimum);
-    slider->SetExponential(mExponential, sliderExponent);
+    slider->SetExponential(mExponential, mExponent);
   }
   if (display.displayMode == AudioFilterParamInfo::kDisplayModeFader) {
     minimumLabel = kMinusInfinityText;

@@ -19,12 +19,12 @@ class AudioFloatSliderParameter : public FloatSliderParameter {
  public:
   // The minimum label and the field's text at the minimum of a fader.
   static constexpr const char* kMinusInfinityText = "-\xE2\x88\x9E";
-  // The numeric field's curve in fader and frequency modes.
-  static constexpr double kFaderFieldExponent = 0.025;
+  // The curve of the numeric field and the slider of a fader. These controls map a position p in
+  // [0, 1] to min + range * p^e; 0.5 puts 0 dB at three quarters of the travel, as on a mixing
+  // console, and scrubs about 0.1 dB a pixel near it.
+  static constexpr double kFaderExponent = 0.5;
+  // Fine steps near the bottom of a frequency-like range.
   static constexpr double kFrequencyExponent = 4.0;
-  // The fader slider's curve: this toolkit's slider maps its position p to min + range * p^e,
-  // and 0.5 puts 0 dB at three quarters of the travel, as on a mixing console.
-  static constexpr double kFaderSliderExponent = 0.5;
 
   // Throws NullInterfaceException when the row's component has no audio description (not an
   // audio effect).

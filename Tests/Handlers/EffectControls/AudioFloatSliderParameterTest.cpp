@@ -111,7 +111,7 @@ TEST_F(AudioSliderRowTest, UnityGainShowsAsZeroDecibels) {
   EXPECT_EQ(field->GetMinimumValueString(), kMinusInfinity);
   EXPECT_EQ(field->GetHorizontalTextAlignment(), 0);
   EXPECT_TRUE(field->IsExponential());
-  EXPECT_DOUBLE_EQ(field->GetExponent(), AudioFloatSliderParameter::kFaderFieldExponent);
+  EXPECT_DOUBLE_EQ(field->GetExponent(), AudioFloatSliderParameter::kFaderExponent);
   // " dB" is three characters.
   EXPECT_EQ(row->GetHotTextPaddingWidth(), 30);
   EXPECT_EQ(field->GetBounds().Width(), SliderParameter::kHotTextWidth + 30);
@@ -213,6 +213,22 @@ TEST_F(AudioSliderRowTest, UnityGainSitsHighOnTheSlider) {
   EXPECT_GT(slider->XForValue(0.0f), width / 2);
   EXPECT_LT(slider->XForValue(0.0f), slider->XForValue(15.0f));
   EXPECT_LT(slider->XForValue(-96.0f), slider->XForValue(-60.0f));
+}
+
+TEST_F(AudioSliderRowTest, ScrubbingAFewPixelsFromUnityMovesALittleAndIsOneUndoStep) {
+  auto row = MakeRow(volume, "Level");
+  const Point start = row->GetHotText()->GetBounds().Center();
+  host.MouseDown(MouseButton::kLeft, start, kKeyModifierNone);
+  for (int i = 1; i <= 5; ++i) {
+    host.MouseMove({start.x - 2 * i, start.y}, kKeyModifierNone);
+  }
+  host.MouseUp(MouseButton::kLeft, {start.x - 10, start.y}, kKeyModifierNone);
+  // Ten pixels down must not fall to silence.
+  const double shown = row->GetHotText()->GetValue();
+  EXPECT_LT(shown, 0.0);
+  EXPECT_GT(shown, -2.0);
+  EXPECT_NEAR(Level(), std::pow(10.0, shown / 20.0), 1e-3);
+  EXPECT_EQ(UndoNames().size(), 1u);
 }
 
 TEST_F(AudioSliderRowTest, AChangeInTheModelReachesTheRow) {
