@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <utility>
 
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/Component.h"
