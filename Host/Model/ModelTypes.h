@@ -28,7 +28,7 @@ enum class ParamType : int {
   TrackMenu = 13,
   Timecode = 14,  // a time, in ticks, held as a double
   Button = 16,
-  AudioGain = 17,  // linear gain shown on a fader scale
+  AudioGain = 17,  // older files: read as FloatSlider with the audio-gain flag
   TimeRemapping = 21,
   Opaque = 22,
   Text = 23,
