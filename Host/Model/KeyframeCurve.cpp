@@ -1016,42 +1016,52 @@ bool KeyframeCurve::Sampler::ScalarsAt(std::span<const TickTime> times, std::spa
     return false;
   }
   const KeyframeCurve& curve = *mCurve;
-  const TickTime* keyTimes = curve.mTimes.data();
-  const auto segments = static_cast<std::ptrdiff_t>(curve.mSegments.size());
-  const std::size_t count = times.size();
-  std::size_t i = 0;
-  while (i < count) {
-    std::ptrdiff_t k = Locate(times[i], Approach::FromRight);
-    if (k < 0 || k >= segments) {
-      values[i] = *ScalarAtSlowly(times[i]);
-      ++i;
+  const CurveSegment* const segments = curve.mSegments.data();
+  const auto segmentCount = static_cast<std::ptrdiff_t>(curve.mSegments.size());
+  const TickTime* time = times.data();
+  const TickTime* const timesEnd = time + times.size();
+  double* value = values.data();
+  while (time != timesEnd) {
+    const std::ptrdiff_t located = Locate(*time, Approach::FromRight);
+    if (located < 0 || located >= segmentCount) {
+      *value++ = *ScalarAtSlowly(*time++);
       continue;
     }
-    // Walk forward while the times keep within the next few segments; anything else (a jump, a
-    // step back, past the last keyframe) is located afresh.
+    // Pointers that move together, so that a graph's loop keeps them all in registers:
+    // bounds[0] and bounds[1] are the segment's start and end times.
+    const CurveSegment* record = segments + located;
+    const CurveInverse* inverse = curve.mInverses.data() + located;
+    const TickTime* bounds = curve.mTimes.data() + located;
+    const CurveSegment* const lastRecord = segments + segmentCount - 1;
     for (;;) {
-      const CurveSegment& record = curve.mSegments[static_cast<std::size_t>(k)];
-      const CurveInverse& inverse = curve.mInverses[static_cast<std::size_t>(k)];
-      const TickTime start = keyTimes[k];
-      const TickTime end = keyTimes[k + 1];
-      do {
-        values[i] = record.YInside(times[i], inverse);
-        ++i;
-      } while (i < count && times[i] >= start && times[i] < end);
-      if (i == count || times[i] < end) {
+      *value++ = record->YInside(*time++, *inverse);
+      if (time == timesEnd) {
         break;
       }
-      std::ptrdiff_t next = k + 1;
-      const auto farthest = k + static_cast<std::ptrdiff_t>(kCursorSteps);
-      while (next < segments && next < farthest && keyTimes[next + 1] <= times[i]) {
-        ++next;
+      if (*time < bounds[1]) {
+        if (*time >= bounds[0]) {
+          continue;
+        }
+        break;  // a step back: located afresh
       }
-      if (next >= segments || keyTimes[next + 1] <= times[i]) {
+      // On by one or two segments (keyframes denser than the times); farther is located afresh.
+      if (record == lastRecord) {
         break;
       }
-      k = next;
+      ++record, ++inverse, ++bounds;
+      if (*time < bounds[1]) {
+        continue;
+      }
+      if (record == lastRecord) {
+        break;
+      }
+      ++record, ++inverse, ++bounds;
+      if (*time < bounds[1]) {
+        continue;
+      }
+      break;
     }
-    mSegment = static_cast<std::size_t>(k);
+    mSegment = static_cast<std::size_t>(record - segments);
   }
   return true;
 }
