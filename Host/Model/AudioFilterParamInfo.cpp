@@ -9,27 +9,6 @@
 #include "Host/Model/EffectCatalogue.h"
 #include "Host/Model/ModelTypes.h"
 
-namespace {
-
-std::string UnitText(ParamUnits units) {
-  switch (units) {
-    case ParamUnits::Percent:
-      return "%";
-    case ParamUnits::Degrees:
-      return "\xC2\xB0";
-    case ParamUnits::Decibels:
-      return " dB";
-    case ParamUnits::Seconds:
-      return " s";
-    case ParamUnits::None:
-    case ParamUnits::Pixels:
-      break;
-  }
-  return {};
-}
-
-}  // namespace
-
 AudioFilterParamInfo::AudioFilterParamInfo(std::vector<AudioParamDescription> params)
     : mParams(std::move(params)) {}
 
@@ -72,7 +51,7 @@ AudioParamDescription AudioFilterParamInfo::Describe(const ComponentParam& param
   display.minimum = static_cast<float>(param.GetMinimum());
   display.maximum = static_cast<float>(param.GetMaximum());
   display.increment = static_cast<float>(param.GetStep());
-  description.unitText = UnitText(param.GetUnits());
+  description.unitText = UnitSymbol(param.GetUnits());
   return description;
 }
 

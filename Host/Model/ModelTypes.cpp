@@ -23,3 +23,20 @@ const char* ToString(EditStatus status) {
   }
   return "?";
 }
+
+const char* UnitSymbol(ParamUnits units) {
+  switch (units) {
+    case ParamUnits::Percent:
+      return "%";
+    case ParamUnits::Degrees:
+      return "\xC2\xB0";
+    case ParamUnits::Decibels:
+      return " dB";
+    case ParamUnits::Seconds:
+      return " s";
+    case ParamUnits::None:
+    case ParamUnits::Pixels:
+      break;
+  }
+  return "";
+}

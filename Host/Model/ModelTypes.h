@@ -64,6 +64,9 @@ enum class ParamUnits : int {
   Decibels = 4,
   Seconds = 5
 };
+// The symbol a number field appends for the units ("%", "°", " dB", " s"); empty for none and
+// pixels.
+const char* UnitSymbol(ParamUnits units);
 
 // Host value-kind codes of a parameter (GetValueKindCode).
 inline constexpr int kValueKindDouble = 1;

@@ -5,6 +5,7 @@
 #include <cstdio>
 
 #include "Host/Model/ComponentParam.h"
+#include "Host/Model/ModelTypes.h"
 #include "Host/Rows/ParameterCache.h"
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/FloatSliderControl.h"
@@ -264,23 +265,7 @@ void SliderParameter::ShowValue(double value) {
 }
 
 std::string SliderParameter::GetUnitsSymbol() const {
-  if (!GetParam()) {
-    return {};
-  }
-  switch (GetParam()->GetUnits()) {
-    case ParamUnits::Percent:
-      return "%";
-    case ParamUnits::Degrees:
-      return "\xC2\xB0";
-    case ParamUnits::Decibels:
-      return " dB";
-    case ParamUnits::Seconds:
-      return " s";
-    case ParamUnits::None:
-    case ParamUnits::Pixels:
-      break;
-  }
-  return {};
+  return GetParam() ? UnitSymbol(GetParam()->GetUnits()) : "";
 }
 
 void SliderParameter::SetRangeLabels(std::string minimum, std::string maximum) {
