@@ -380,6 +380,8 @@ class EffectControlsListView : public SubView, public Listener {
   // The selection the list was last built for, and whether a build ran since the last clear.
   std::vector<TrackItemGroup> mTargetSelection;
   bool mBuilt = false;
+  // The master clip the rows were built for (null: the sequence clip's own effects).
+  MasterClipRef mBuiltMasterClip;
 
   bool mPendingAutoSelect = false;
   int mPendingAutoSelectIndex = -1;

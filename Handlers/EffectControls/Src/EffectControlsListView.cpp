@@ -184,7 +184,7 @@ void EffectControlsListView::DoSequenceClipSelectionChanged(const SequenceRef& s
 
   const bool sameTarget = mTargetKind == oldKind && mShowVideo == oldShowVideo &&
                           mShowAudio == oldShowAudio && mTransitionChain == oldTransitionChain &&
-                          groups == mTargetSelection && mBuilt;
+                          groups == mTargetSelection && mBuilt && mMasterClip == mBuiltMasterClip;
   mTargetSelection = std::move(groups);
   if (sameTarget) {
     UpdateParamsUI(*mEditTime, true);

@@ -94,6 +94,7 @@ void EffectControlsListView::ClearAndRebuildList() {
     }
   }
   mBuilt = true;
+  mBuiltMasterClip = mMasterClip;
   UpdateVScrollBar();
   BroadcastListChanged();
   Invalidate();
