@@ -48,6 +48,7 @@ bool IsValidUTF8(std::string_view text) {
 
 void TextEditBuffer::Reset(std::string text) {
   mText = IsValidUTF8(text) ? std::move(text) : std::string();
+  mOriginal = mText;
   SelectAll();
 }
 
@@ -154,6 +155,20 @@ bool TextEditBuffer::HandleKey(const KeyEvent& event) {
         return true;
       }
       return false;
+    // Undo and redo belong to the field while it is edited: reaching the project's undo stack
+    // they would take back an earlier edit the user is not looking at. Undo restores the text
+    // the field started with; redo has nothing to redo.
+    case KeyCode::kZ:
+      if (IsCtrlDown(event.modifiers)) {
+        if (!shift) {
+          mText = mOriginal;
+          SelectAll();
+        }
+        return true;
+      }
+      return false;
+    case KeyCode::kY:
+      return IsCtrlDown(event.modifiers);
     default:
       return false;
   }

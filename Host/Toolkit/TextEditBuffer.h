@@ -11,7 +11,8 @@ class Font;
 
 // The text of a one-line field while the user types in it: UTF-8 text, a caret and a selection
 // (byte offsets that always fall on character boundaries). Hot-text controls hold one while
-// editing. Keys: Left/Right (Shift extends), Home/End, Backspace, Delete, Ctrl+A.
+// editing. Keys: Left/Right (Shift extends), Home/End, Backspace, Delete, Ctrl+A; Ctrl+Z
+// brings back the text given to Reset, and Ctrl+Z, Ctrl+Shift+Z and Ctrl+Y never leave the field.
 class TextEditBuffer {
  public:
   // Replaces the text and selects all of it (typing then replaces it).
@@ -43,6 +44,7 @@ class TextEditBuffer {
   void DeleteSelection();
 
   std::string mText;
+  std::string mOriginal;  // as given to Reset
   std::size_t mCaret = 0;
   std::size_t mAnchor = 0;  // the other end of the selection
 };
