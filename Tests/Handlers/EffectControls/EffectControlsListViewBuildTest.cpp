@@ -390,8 +390,8 @@ TEST_F(ListViewTest, HiddenParametersAreSetAside) {
 }
 
 TEST_F(ListViewTest, RebuildDestroysTheOldRowsAndAnnouncesTheNewList) {
-  ListMessageRecorder own;
-  ListMessageRecorder keyframes;
+  MessageRecorder own;
+  MessageRecorder keyframes;
   own.Listen(list->GetOwnStation());
   keyframes.Listen(list->GetKeyframeViewStation());
   const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity)});
@@ -418,7 +418,7 @@ TEST_F(ListViewTest, RebuildDestroysTheOldRowsAndAnnouncesTheNewList) {
 TEST_F(ListViewTest, ClearSelectionEmptiesBothSelectionsAndEveryFlag) {
   const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_Crop)});
   Select({clip});
-  ListMessageRecorder own;
+  MessageRecorder own;
   own.Listen(list->GetOwnStation());
 
   list->ClearSelection();  // nothing selected: no announcement
@@ -600,7 +600,7 @@ class FailingListView : public EffectControlsListView {
 TEST_F(ListViewTest, ABuildThatThrowsLeavesAnEmptyAnnouncedListAndTheNextBuildWorks) {
   const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_Crop)});
   auto failing = std::make_shared<FailingListView>(nullptr, "EffectControlsTest.Failing");
-  ListMessageRecorder own;
+  MessageRecorder own;
   own.Listen(failing->GetOwnStation());
   sequence->SetSelection({clip});
 

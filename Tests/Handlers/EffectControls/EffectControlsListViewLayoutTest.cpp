@@ -109,7 +109,7 @@ TEST_F(ListLayoutTest, ScrollingIsClampedToTheContent) {
   EXPECT_EQ(list->GetScrollOffset(), content - 200);
   list->OnVScroll(ScrollCode::kThumbTrack, -40, 0);
   EXPECT_EQ(list->GetScrollOffset(), 0);
-  ListMessageRecorder keyframes;
+  MessageRecorder keyframes;
   keyframes.Listen(list->GetKeyframeViewStation());
   BroadcastMessage("EffectControlsTest.List",
                    ScrollVerticalMessage(ScrollCode::kThumbTrack, 30, 0));
@@ -229,8 +229,8 @@ TEST_F(ListLayoutTest, DisclosureChangeMovesTheRowsBelowAndAnnouncesIt) {
   const TrackItemRef clip = AddClip(v1, {Make(kMatchName_Opacity), Make(kMatchName_Crop)});
   Open();
   Select({clip});
-  ListMessageRecorder own;
-  ListMessageRecorder keyframes;
+  MessageRecorder own;
+  MessageRecorder keyframes;
   own.Listen(list->GetOwnStation());
   keyframes.Listen(list->GetKeyframeViewStation());
   const auto& rows = list->GetVideoItems();

@@ -28,25 +28,9 @@
 #include "Host/Rows/EffectItem.h"
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/ViewHost.h"
+#include "Tests/Host/Model/MessageRecorder.h"
 
 inline constexpr TickTime kSecond = kTicksPerSecond;
-
-// Records the type names of the messages of the stations it listens on.
-class ListMessageRecorder : public Listener {
- public:
-  void Listen(const StationName& station) { AddListener(station, *this); }
-  void ListenToMessage(const Message& message) override {
-    names.emplace_back(message.GetTypeName());
-  }
-  int Count(std::string_view typeName) const {
-    int count = 0;
-    for (const std::string& name : names) {
-      count += name == typeName ? 1 : 0;
-    }
-    return count;
-  }
-  std::vector<std::string> names;
-};
 
 // Stands in for the panel view's scroll bar: keeps what the list tells it; its position moves
 // only when someone sets it, so the list's own clamping shows.
