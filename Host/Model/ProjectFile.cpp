@@ -2,14 +2,17 @@
 
 #include <unistd.h>
 
+#include <algorithm>
 #include <cmath>
 #include <cstdio>
 #include <filesystem>
 #include <fstream>
 #include <map>
 #include <nlohmann/json.hpp>
+#include <optional>
 #include <set>
 #include <sstream>
+#include <string_view>
 
 #include "Host/Messaging/PropertyList.h"
 #include "Host/Model/Component.h"
@@ -301,6 +304,147 @@ struct LoadError {
   std::string message;
 };
 
+// Deeper than any file the model writes (about 16 levels) with room for nested masks. Saving and
+// loading recurse over the document, so deeper input is refused while it is read, before anything
+// recurses over it.
+constexpr std::size_t kMaxNestingDepth = 64;
+
+// Text of the file fit for an error message: one line, at most `maxShown` bytes of it (cut at a
+// character boundary) however long it is.
+std::string Printable(std::string_view text, std::size_t maxShown = 40) {
+  std::size_t shownLength = std::min(text.size(), maxShown);
+  while (shownLength > 0 && shownLength < text.size() &&
+         (static_cast<unsigned char>(text[shownLength]) & 0xC0) == 0x80) {
+    --shownLength;
+  }
+  std::string shown;
+  for (const char c : text.substr(0, shownLength)) {
+    shown += static_cast<unsigned char>(c) < 0x20 || c == 0x7f ? '?' : c;
+  }
+  if (shownLength < text.size()) {
+    shown += "...";
+  }
+  return shown;
+}
+
+// Messages quote the file's own text (keys, names); keep them to one readable line.
+std::string OneLine(std::string_view message) {
+  return Printable(message, 400);
+}
+
+// Builds the document as the library's own parser does, but knows the path of the value it is
+// reading ("sequences[0].tracks[2]"), so that whatever the library reports (bad syntax, a number
+// beyond the double range) names its place, and refuses nesting beyond kMaxNestingDepth.
+class DocumentReader final : public nlohmann::json_sax<json> {
+ public:
+  // Throws LoadError.
+  static json Read(std::string_view text) {
+    DocumentReader reader;
+    json::sax_parse(text.begin(), text.end(), &reader);
+    return std::move(reader.mRoot);
+  }
+
+  bool null() override { return Add(nullptr); }
+  bool boolean(bool value) override { return Add(value); }
+  bool number_integer(number_integer_t value) override { return Add(value); }
+  bool number_unsigned(number_unsigned_t value) override { return Add(value); }
+  bool number_float(number_float_t value, const string_t&) override { return Add(value); }
+  bool string(string_t& value) override { return Add(std::move(value)); }
+  bool binary(binary_t& value) override { return Add(json::binary(std::move(value))); }
+  bool start_object(std::size_t) override { return Open(json::object()); }
+  bool key(string_t& key) override {
+    mOpen.back().key = std::move(key);
+    return true;
+  }
+  bool end_object() override { return Close(); }
+  bool start_array(std::size_t) override { return Open(json::array()); }
+  bool end_array() override { return Close(); }
+
+  bool parse_error(std::size_t, const std::string&,
+                   const nlohmann::json::exception& error) override {
+    // The library's text starts with its own tag, "[json.exception.parse_error.101] ".
+    std::string what = error.what();
+    if (const auto tagEnd = what.find("] "); what.starts_with("[json.") && tagEnd != what.npos) {
+      what.erase(0, tagEnd + 2);
+    }
+    const std::string place = PathOfNextValue();
+    throw LoadError{(place.empty() ? "" : place + ": ") + "not valid JSON: " + what};
+  }
+
+ private:
+  struct OpenValue {
+    json* value;  // owned by the document; stays put while its members are read
+    // The member being read when `value` is an object; none between members.
+    std::optional<std::string> key;
+  };
+
+  // Places a value in the innermost open array or object (or as the document) and gives its place.
+  json* Put(json value) {
+    if (mOpen.empty()) {
+      mRoot = std::move(value);
+      return &mRoot;
+    }
+    json& parent = *mOpen.back().value;
+    if (parent.is_array()) {
+      parent.push_back(std::move(value));
+      return &parent.back();
+    }
+    json& member = parent[*mOpen.back().key];
+    member = std::move(value);
+    return &member;
+  }
+
+  bool Add(json value) {
+    Put(std::move(value));
+    EndMember();
+    return true;
+  }
+
+  bool Open(json container) {
+    if (mOpen.size() >= kMaxNestingDepth) {
+      throw LoadError{PathOfNextValue() + ": nested deeper than " +
+                      std::to_string(kMaxNestingDepth) + " levels"};
+    }
+    mOpen.push_back({Put(std::move(container)), std::nullopt});
+    return true;
+  }
+
+  bool Close() {
+    mOpen.pop_back();
+    EndMember();
+    return true;
+  }
+
+  void EndMember() {
+    if (!mOpen.empty()) {
+      mOpen.back().key.reset();
+    }
+  }
+
+  // `reading`: the open value's last member is still being read (it is open itself).
+  static std::string Join(const std::string& path, const OpenValue& open, bool reading) {
+    if (open.value->is_array()) {
+      const std::size_t size = open.value->size();
+      return path + "[" + std::to_string(reading ? size - 1 : size) + "]";
+    }
+    if (!open.key) {
+      return path;
+    }
+    return path.empty() ? Printable(*open.key) : path + "." + Printable(*open.key);
+  }
+
+  std::string PathOfNextValue() const {
+    std::string path;
+    for (std::size_t i = 0; i < mOpen.size(); ++i) {
+      path = Join(path, mOpen[i], i + 1 < mOpen.size());
+    }
+    return path;
+  }
+
+  json mRoot;
+  std::vector<OpenValue> mOpen;
+};
+
 // A place in the file: the JSON value and its path ("sequences[0].tracks[2]").
 class Node {
  public:
@@ -469,7 +613,7 @@ ParamValue LoadValue(const Node& node) {
     return node.Member("string").String();
   if (key == "blob")
     return ParamBlob{FromHex(node.Member("blob"))};
-  node.Fail("unknown value kind '" + key + "'");
+  node.Fail("unknown value kind '" + Printable(key) + "'");
 }
 
 FrameRate LoadFrameRate(const Node& node) {
@@ -514,12 +658,14 @@ Markers LoadMarkers(const Node& node) {
   return markers;
 }
 
-// Ids: every object of the file has its own; objects without one get a fresh id after loading.
+// Ids: every object of the file has its own; objects without one, and objects the model makes
+// that the file does not list (the chain of a master clip written without one), get fresh ids
+// once the whole file is read, so a fresh id never takes one that appears later in the file.
 class IdRegistry {
  public:
   void Claim(const Node& node, ModelObject& object) {
     if (!node.Has("id")) {
-      mUnassigned.push_back(&object);
+      Adopt(object);
       return;
     }
     const auto idNode = node.Member("id");
@@ -531,17 +677,21 @@ class IdRegistry {
     object.SetID(id);
   }
 
-  // Called once everything is built: fresh ids never collide with the file's.
+  // An object the file does not describe.
+  void Adopt(ModelObject& object) { mUnassigned.emplace_back(&object); }
+
+  // Called once everything is built.
   void Finish() {
     if (!mSeen.empty())
       ModelObject::ReserveObjectIDsThrough(*mSeen.rbegin());
-    for (auto* object : mUnassigned)
+    for (const auto& object : mUnassigned)
       object->SetID(ModelObject::AllocateObjectID());
   }
 
  private:
   std::set<std::int64_t> mSeen;
-  std::vector<ModelObject*> mUnassigned;
+  // Held, not pointed at: the loader may drop an object before Finish.
+  std::vector<boost::intrusive_ptr<ModelObject>> mUnassigned;
 };
 
 class Loader {
@@ -627,6 +777,8 @@ class Loader {
       clip->GetProperties() = LoadProperties(node.Member("properties"));
     if (node.Has("videoChain")) {
       LoadChainInto(node.Member("videoChain"), *clip->GetVideoChain(), MediaType::Video);
+    } else {
+      mIds.Adopt(*clip->GetVideoChain());
     }
     mMasterClips[clip->GetID()] = clip;
     return clip;
@@ -741,8 +893,11 @@ class Loader {
       node.Member("outro").Fail("must not be negative");
     }
     item->SetIntroOutroLocked(node.Bool("introOutroLocked", false));
-    if (node.Has("chain"))
+    if (node.Has("chain")) {
       LoadChainInto(node.Member("chain"), *item->GetComponentChain(), mediaType);
+    } else {
+      mIds.Adopt(*item->GetComponentChain());
+    }
     return item;
   }
 
@@ -789,6 +944,9 @@ class Loader {
       if (component->GetMediaType() != mediaType) {
         c.Member("mediaType").Fail("does not match its chain");
       }
+      if (component->IsMask()) {
+        c.Member("role").Fail("a mask belongs in its effect's masks, not in a chain");
+      }
       components.push_back(component);
     }
     chain.SetComponents(std::move(components));
@@ -824,8 +982,14 @@ class Loader {
       component->GetExpansionProperties() = LoadProperties(node.Member("expansion"));
     }
     if (node.Has("masks")) {
+      const auto masksNode = node.Member("masks");
+      const auto elements = masksNode.Elements();
+      if (!elements.empty() && !component->CanTakeMasks()) {
+        masksNode.Fail("effect \"" + Printable(component->GetMatchName()) +
+                       "\" cannot take masks (canTakeMasks is false)");
+      }
       std::vector<ComponentRef> masks;
-      for (const auto& m : node.Member("masks").Elements())
+      for (const auto& m : elements)
         masks.push_back(LoadComponent(m));
       component->SetMasks(std::move(masks));
     }
@@ -1001,16 +1165,14 @@ class Loader {
 }  // namespace
 
 ProjectLoadResult ProjectFile::LoadFromString(std::string_view text) {
-  json root;
   try {
-    root = json::parse(text.begin(), text.end());
-  } catch (const json::parse_error& e) {
-    return {nullptr, std::string("not valid JSON: ") + e.what()};
-  }
-  try {
+    const json root = DocumentReader::Read(text);
     return {Loader().Load(root), {}};
   } catch (const LoadError& e) {
-    return {nullptr, e.message};
+    return {nullptr, OneLine(e.message)};
+  } catch (const std::exception& e) {
+    // The checks above should leave the library nothing to throw; if it does, still no crash.
+    return {nullptr, OneLine(std::string("file: cannot be read: ") + e.what())};
   }
 }
 
