@@ -24,6 +24,9 @@ struct ProjectLoadResult {
 // file are kept; later objects of the process get higher ones.
 class ProjectFile {
  public:
+  static constexpr const char* kFormatName = "effectcontrols-project";
+  static constexpr int kFormatVersion = 1;
+
   static ProjectLoadResult LoadFromString(std::string_view json);
   // Also reports a file that cannot be opened or read ("<path>: cannot open").
   static ProjectLoadResult Load(const std::string& path);
