@@ -5,6 +5,9 @@ target_compile_options(ec_options INTERFACE
   -Wshadow -Wnon-virtual-dtor -Woverloaded-virtual -Wcast-align
   -Wimplicit-fallthrough -Wmissing-declarations)
 target_include_directories(ec_options INTERFACE ${PROJECT_SOURCE_DIR})
+# Diagnostics, assertions and debug information name sources relative to the repository, so they
+# read the same on every machine and in every checkout.
+target_compile_options(ec_options INTERFACE -ffile-prefix-map=${PROJECT_SOURCE_DIR}/=)
 # GCC 12 reports -Wrestrict inside libstdc++'s string concatenation when optimising ("'" +
 # std::string(x) + "'"), a known false positive fixed in GCC 13; it would fail every release build.
 if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)
