@@ -29,7 +29,9 @@ class EffectItem;
 class FilterItem;
 class KeyframeMultiSelection;
 class MultiPictureButton;
+struct EffectRowRules;
 struct ParameterControlInfo;
+struct PlannedRow;
 enum class ScrollCode : std::int32_t;
 
 // Bits that change how the list builds and draws (see HasECPStyle). The effect controls panel
@@ -154,12 +156,9 @@ class EffectControlsListView : public SubView, public Listener {
   TrackItemRef LoadAudioFilters(const std::vector<TrackItemRef>& audioItems);
   void LoadVideoTransition(const TrackItemRef& trackItem);
   void LoadAudioTransition(const TrackItemRef& trackItem);
-  // The row of one effect with its mask rows and parameter rows (not yet finished or shown).
-  std::shared_ptr<FilterItem> LoadFilter(MediaType mediaType, const TrackItemRef& trackItem,
-                                         const ComponentRef& component, bool masterClipMode,
-                                         bool allowMasks, int subgroupLevel, bool isMask);
   // The row (or rows) of one parameter, appended to `parentRow`. `controlIndex` is the
-  // parameter's position in its component.
+  // parameter's position in its component. The hook decides for any but an audio effect, whose
+  // own description has already left out what it hides.
   void LoadFilterParameterControls(const TrackItemRef& trackItem,
                                    const std::shared_ptr<EffectItem>& parentRow, int controlIndex,
                                    const ComponentRef& component, const ComponentParamRef& param,
@@ -327,6 +326,20 @@ class EffectControlsListView : public SubView, public Listener {
   void AutoSelectNthEmbeddedEffect();
   // Every top row of every section, in display order.
   void ForEachTopRow(const std::function<void(const std::shared_ptr<EffectItem>&)>& visit) const;
+  // What the style says about which rows exist.
+  EffectRowRules MakeRowRules() const;
+  // The rows of planned effects, made (not yet finished or shown) and appended to `section`;
+  // `trackItem` is the item they belong to.
+  void AddEffectRows(EffectItemList& section, const std::vector<PlannedRow>& effects,
+                     const TrackItemRef& trackItem);
+  std::shared_ptr<FilterItem> MakeEffectRow(const PlannedRow& effect,
+                                            const TrackItemRef& trackItem);
+  // The rows under an effect or a group; `masterClipEffect` is that of the effect above.
+  void AddPlannedRows(const std::shared_ptr<EffectItem>& parent,
+                      const std::vector<PlannedRow>& rows, const TrackItemRef& trackItem,
+                      bool masterClipEffect);
+  void AddGroupRow(const std::shared_ptr<EffectItem>& parent, const PlannedRow& group,
+                   const TrackItemRef& trackItem, bool masterClipEffect);
   ParameterControlInfo MakeParameterInfo(const TrackItemRef& trackItem,
                                          const ComponentRef& component,
                                          const ComponentParamRef& param, bool masterClipMode) const;

@@ -1,22 +1,19 @@
 // Building the rows of the effect list from its target, and tearing them down.
-#include <algorithm>
-#include <cstdint>
-#include <string_view>
+#include <cstddef>
 #include <utility>
 
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/AudioPartInfo.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
+#include "Handlers/EffectControls/Src/EffectRowPlan.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Handlers/EffectControls/Src/FilterItemOptions.h"
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/Station.h"
-#include "Host/Model/AudioFilterParamInfo.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentChain.h"
 #include "Host/Model/ComponentParam.h"
-#include "Host/Model/EffectCatalogue.h"
 #include "Host/Model/KeyframeMultiSelection.h"
 #include "Host/Model/MasterClip.h"
 #include "Host/Model/Media.h"
@@ -29,22 +26,6 @@
 
 namespace {
 
-// Effects the build treats by their match name.
-constexpr std::string_view kMatchNameVideoLimiter = "XO.KRVN VideoLimiter";
-constexpr std::string_view kMatchNameDigitalVideoLimiter = "XO.KRVN DigitalVideoLimiter";
-constexpr std::string_view kMatchNameWarpStabilizer = "XO.KRVN WarpStabilizer";
-constexpr std::string_view kMatchNameAutoReframe = "XO.KRVN AutoReframe";
-constexpr std::string_view kMatchNameGraphicGroup = "XO.KRVN GraphicGroup";
-
-// Audio part order keys at or above this are not parts.
-constexpr std::uint32_t kMaxPartOrderKey = 10000;
-
-// An audio effect whose plug-in brings its own window (the host's audio effects with a setup
-// dialog) gets the custom-setup and channel-map rows.
-bool HasCustomAudioUI(const Component& component) {
-  return component.GetMediaType() == MediaType::Audio && component.HasSetupDialog();
-}
-
 // The first item of a group's video or audio items; a group that lists a missing item is a
 // broken model, reported as a missing interface (the rebuild then ends).
 const TrackItemRef* FirstItem(const std::vector<TrackItemRef>& items) {
@@ -55,20 +36,6 @@ const TrackItemRef* FirstItem(const std::vector<TrackItemRef>& items) {
     throw NullInterfaceException("ITrackItem");
   }
   return &items.front();
-}
-
-// One group row open while a component's parameters are walked.
-struct OpenGroup {
-  std::shared_ptr<EffectItem> row;
-  // Parameters still to come for a counted group; -1 for a group closed by a group end.
-  long long remaining = -1;
-};
-
-// Closes the innermost open group: its children follow its expansion from now on.
-void CloseGroup(std::vector<OpenGroup>& stack) {
-  const std::shared_ptr<EffectItem> row = stack.back().row;
-  stack.pop_back();
-  row->SetIsExpanded(row->IsExpanded());
 }
 
 }  // namespace
@@ -247,62 +214,19 @@ void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
   if (!mVideoChain) {
     return;
   }
-  const bool isTemplate = masterClip && masterClip->IsTemplate();
-
-  // Intrinsics, last in the chain first.
-  for (int position = mVideoChain->GetCount() - 1; position >= 0; --position) {
-    const ComponentRef component = mVideoChain->GetAt(position);
-    if (!component->IsIntrinsic()) {
-      continue;
-    }
-    if (HasECPStyle(kStyleHideTimeRemapping) && component->IsTimeRemapping()) {
-      continue;
-    }
-    if (component->IsCapsule() && !isTemplate) {
-      continue;
-    }
-    auto row = LoadFilter(MediaType::Video, trackItem, component, masterClipMode, true, 0, false);
-    if (component->GetMatchName() == kMatchNameGraphicGroup) {
-      mGraphicsItems.AddItem(row);
-    } else {
-      mVideoItems.AddItem(row);
-    }
-  }
-
-  int lastGraphics = -1;
-  for (int position = 0; position < mVideoChain->GetCount(); ++position) {
-    if (mVideoChain->GetAt(position)->IsGraphicsComponent()) {
-      lastGraphics = position;
-    }
-  }
-
-  if (lastGraphics >= 0) {
-    // A graphics clip: its layers in chain order, then the master graphic's.
-    for (const ComponentChainRef& layers : {mVideoChain, mMasterGraphicChain}) {
-      if (!layers) {
-        continue;
-      }
-      for (const ComponentRef& component : layers->GetComponents()) {
-        if (!component->IsIntrinsic()) {
-          mGraphicsItems.AddItem(
-              LoadFilter(MediaType::Video, trackItem, component, masterClipMode, true, 0, false));
-        }
-      }
-    }
-    if (!mGraphicsItems.IsEmpty()) {
-      mGraphicsExpanded = true;
-      if (mGraphicsExpander) {
-        mGraphicsExpander->SetValue(0);
-      }
-    }
-  } else {
-    // Applied effects, the last applied at the top.
-    for (int position = mVideoChain->GetCount() - 1; position >= 0; --position) {
-      const ComponentRef component = mVideoChain->GetAt(position);
-      if (!component->IsIntrinsic()) {
-        mVideoItems.AddItem(
-            LoadFilter(MediaType::Video, trackItem, component, masterClipMode, true, 0, false));
-      }
+  EffectRowSource source;
+  source.mode = masterClipMode ? EffectRowMode::MasterClip : EffectRowMode::Clip;
+  source.videoChain = mVideoChain;
+  source.masterGraphicChain = mMasterGraphicChain;
+  source.showCapsules = masterClip && masterClip->IsTemplate();
+  const EffectRowPlan plan = PlanEffectRows(source, MakeRowRules());
+  AddEffectRows(mGraphicsItems, plan.graphics, trackItem);
+  AddEffectRows(mVideoItems, plan.video, trackItem);
+  mVideoLimiterPresent = mVideoLimiterPresent || plan.videoLimiterPresent;
+  if (plan.graphicsLayers && !mGraphicsItems.IsEmpty()) {
+    mGraphicsExpanded = true;
+    if (mGraphicsExpander) {
+      mGraphicsExpander->SetValue(0);
     }
   }
 
@@ -337,25 +261,13 @@ void EffectControlsListView::RebuildAudioClipView(const TrackItemGroup* inTrackI
 
 TrackItemRef EffectControlsListView::LoadAudioFilters(const std::vector<TrackItemRef>& audioItems) {
   mTargetKind = kTargetClip;
-  // Parts in the order of their keys. Items that share a key keep the order they came in: each
-  // is a part of the clip and must not disappear from the list.
-  std::vector<TrackItemRef> ordered;
-  for (const TrackItemRef& item : audioItems) {
-    if (item && item->IsClip() && item->GetPartOrderKey() < kMaxPartOrderKey) {
-      ordered.push_back(item);
-    }
-  }
-  std::stable_sort(ordered.begin(), ordered.end(),
-                   [](const TrackItemRef& a, const TrackItemRef& b) {
-                     return a->GetPartOrderKey() < b->GetPartOrderKey();
-                   });
-  if (ordered.size() > static_cast<std::size_t>(kMaxAudioParts)) {
-    // The parts' buttons have a command each, kMaxAudioParts of them.
-    ordered.resize(static_cast<std::size_t>(kMaxAudioParts));
-  }
+  EffectRowSource source;
+  source.mode = IsViewingMasterClip() ? EffectRowMode::MasterClip : EffectRowMode::Clip;
+  source.audioItems = audioItems;
+  const EffectRowPlan plan = PlanEffectRows(source, MakeRowRules());
 
-  for (std::size_t index = 0; index < ordered.size(); ++index) {
-    const TrackItemRef& item = ordered[index];
+  for (std::size_t index = 0; index < plan.audioParts.size(); ++index) {
+    const TrackItemRef& item = plan.audioParts[index].item;
     auto part = std::make_shared<AudioPartInfo>(item);
     mAudioParts.push_back(part);
     part->SetExpanded(true);
@@ -365,7 +277,7 @@ TrackItemRef EffectControlsListView::LoadAudioFilters(const std::vector<TrackIte
       expander->Show();
       part->SetExpanderButton(std::move(expander));
     }
-    if (ordered.size() >= 2) {
+    if (plan.audioParts.size() >= 2) {
       if (auto play = CreatePlayButton(partIndex)) {
         play->Show();
         play->SetEnabled(CanPlayAudioPart(partIndex));
@@ -379,17 +291,13 @@ TrackItemRef EffectControlsListView::LoadAudioFilters(const std::vector<TrackIte
   }
 
   NewKeyframeSelection();
-  for (const auto& part : mAudioParts) {
-    const TrackItemRef& item = part->GetTrackItem();
-    if (const ComponentChainRef& chain = item->GetComponentChain()) {
-      for (const ComponentRef& component : chain->GetComponents()) {
-        part->GetItems().AddItem(
-            LoadFilter(MediaType::Audio, item, component, false, true, 0, false));
-      }
-    }
-    FinishAndShowRows(part->GetItems());
+  for (std::size_t index = 0; index < plan.audioParts.size(); ++index) {
+    const PlannedAudioPart& planned = plan.audioParts[index];
+    EffectItemList& rows = mAudioParts[index]->GetItems();
+    AddEffectRows(rows, planned.rows, planned.item);
+    FinishAndShowRows(rows);
   }
-  return ordered.empty() ? nullptr : ordered.front();
+  return plan.audioParts.empty() ? nullptr : plan.audioParts.front().item;
 }
 
 bool EffectControlsListView::CanPlayAudioPart(int index) const {
@@ -475,15 +383,17 @@ void EffectControlsListView::RebuildTransitionComponentView(
   LoadVideoTransition(item);
   mVideoTrackItem = item;
   NewKeyframeSelection();
-  // The first component of the chain is the transition itself, which its row presents; the
-  // next one carries the settings the transition exposes as an effect.
-  if (mTransitionChain && mTransitionChain->GetCount() > 1) {
-    auto row =
-        LoadFilter(MediaType::Video, item, mTransitionChain->GetAt(1), false, false, 0, false);
-    mVideoItems.AddItem(row);
-    row->FinishCreateSelf();
-    row->Show();
+  EffectRowSource source;
+  source.mode = EffectRowMode::TransitionEffects;
+  source.videoChain = mTransitionChain;
+  const EffectRowPlan plan = PlanEffectRows(source, MakeRowRules());
+  const std::size_t transitionRows = mVideoItems.Size();
+  AddEffectRows(mVideoItems, plan.video, item);
+  for (std::size_t index = transitionRows; index < mVideoItems.Size(); ++index) {
+    mVideoItems[index]->FinishCreateSelf();
+    mVideoItems[index]->Show();
   }
+  mVideoLimiterPresent = mVideoLimiterPresent || plan.videoLimiterPresent;
   UpdateParamsUI(*mEditTime, true);
 }
 
@@ -517,121 +427,89 @@ void EffectControlsListView::LoadAudioTransition(const TrackItemRef& trackItem) 
 
 // --- One effect ---
 
-std::shared_ptr<FilterItem> EffectControlsListView::LoadFilter(MediaType mediaType,
-                                                               const TrackItemRef& trackItem,
-                                                               const ComponentRef& component,
-                                                               bool masterClipMode, bool allowMasks,
-                                                               int subgroupLevel, bool isMask) {
-  if (!component) {
-    throw NullInterfaceException("IComponent");
-  }
-  const bool maskRow = isMask && component->GetMatchName() == kMatchName_Mask;
+EffectRowRules EffectControlsListView::MakeRowRules() const {
+  EffectRowRules rules;
+  rules.hideTimeRemapping = HasECPStyle(kStyleHideTimeRemapping);
+  rules.noMaskControls = HasECPStyle(kStyleNoMaskControls);
+  rules.noAudio = HasECPStyle(kStyleNoAudio);
+  rules.maxAudioParts = static_cast<std::size_t>(kMaxAudioParts);
+  return rules;
+}
 
+void EffectControlsListView::AddEffectRows(EffectItemList& section,
+                                           const std::vector<PlannedRow>& effects,
+                                           const TrackItemRef& trackItem) {
+  for (const PlannedRow& effect : effects) {
+    section.AddItem(MakeEffectRow(effect, trackItem));
+  }
+}
+
+std::shared_ptr<FilterItem> EffectControlsListView::MakeEffectRow(const PlannedRow& effect,
+                                                                  const TrackItemRef& trackItem) {
   FilterItemOptions options;
-  options.topLevel = subgroupLevel == 0;
+  options.topLevel = effect.groupLevel == 0;
   options.checkboxSwitch = HasECPStyle(kStyleCheckboxSwitch);
   options.option6 = HasECPStyle(kStyleFilterOption6);
   options.indent = HasECPStyle(kStyleIndentFilters) ? 40 : 0;
   options.startCollapsed = HasECPStyle(kStyleStartCollapsed);
   options.noIndent = HasECPStyle(kStyleNoFilterIndent);
 
-  auto row = std::make_shared<FilterItem>(mediaType, component, trackItem, mSequence,
-                                          masterClipMode ? mMasterClip : nullptr, options,
+  auto row = std::make_shared<FilterItem>(effect.mediaType, effect.component, trackItem, mSequence,
+                                          effect.masterClipEffect ? mMasterClip : nullptr, options,
                                           mOwnStation, this);
-  row->SetIsMask(maskRow);
-  row->SetGroupLevel(subgroupLevel);
-  if (component->IsOffline()) {
-    return row;
-  }
-  // Layers of a master graphic's chain nest no deeper here: the row's own subgroup level says
-  // how deep a layer sits.
-  const int baseLevel = subgroupLevel;
-
-  if (mediaType == MediaType::Audio && HasCustomAudioUI(*component)) {
-    for (const bool second : {false, true}) {
-      row->AddItem(
-          ParameterRowFactory::CreateCustomAudioFilterRow(this, mOwnStation, component, second));
-    }
-  }
-
-  if (mediaType == MediaType::Video &&
-      (component->GetMatchName() == kMatchNameVideoLimiter ||
-       component->GetMatchName() == kMatchNameDigitalVideoLimiter)) {
-    mVideoLimiterPresent = true;
-  }
-
-  if (mediaType == MediaType::Video && !HasECPStyle(kStyleNoMaskControls)) {
-    const std::string& matchName = component->GetMatchName();
-    const bool takesMaskShape = component->CanTakeMasks() &&
-                                (!component->IsIntrinsic() || matchName == kMatchName_Opacity) &&
-                                allowMasks && !masterClipMode &&
-                                matchName != kMatchNameWarpStabilizer &&
-                                matchName != kMatchNameAutoReframe;
-    if (takesMaskShape) {
-      if (auto shape = ParameterRowFactory::CreateMaskShapeRow(this, mOwnStation, component)) {
-        shape->SetGroupLevel(baseLevel);
-        row->AddItem(std::move(shape));
-      }
-    }
-    for (const ComponentRef& mask : component->GetMasks()) {
-      row->AddItem(
-          LoadFilter(MediaType::Video, trackItem, mask, false, false, baseLevel + 1, true));
-    }
-  }
-
-  // Parameters, with the open groups on a stack above the effect row.
-  std::vector<OpenGroup> stack;
-  auto container = [&]() -> std::shared_ptr<EffectItem> {
-    return stack.empty() ? std::shared_ptr<EffectItem>(row) : stack.back().row;
-  };
-  auto level = [&] { return baseLevel + static_cast<int>(stack.size()); };
-  const std::vector<ComponentParamRef>& params = component->GetParams();
-  for (std::size_t position = 0; position < params.size(); ++position) {
-    const ComponentParamRef& param = params[position];
-    // A counted group spans the parameters that follow it, whatever they are.
-    for (OpenGroup& open : stack) {
-      if (open.remaining > 0) {
-        --open.remaining;
-      }
-    }
-    if (param->GetType() == ParamType::GroupBegin) {
-      ParameterRowRequest request;
-      request.info = MakeParameterInfo(trackItem, component, param, masterClipMode);
-      request.listStyle = mStyle;
-      request.componentIsMask = component->IsMask();
-      std::shared_ptr<GroupBeginParameter> group = ParameterRowFactory::CreateGroupRow(request);
-      if (group) {
-        group->SetGroupLevel(level());
-        group->SetAside(!group->IsParamVisible());
-        container()->AddItem(group);
-        OpenGroup open{group, -1};
-        if (param->GetGroupKind() == GroupKind::Counted) {
-          open.remaining = static_cast<long long>(GroupBeginParameter::CountGroupEntries(*param));
-        }
-        stack.push_back(std::move(open));
-      }
-    } else if (param->GetType() == ParamType::GroupEnd) {
-      // Closes the innermost group that waits for an end, and the counted groups inside it.
-      const auto waiting = std::find_if(stack.rbegin(), stack.rend(),
-                                        [](const OpenGroup& open) { return open.remaining < 0; });
-      if (waiting != stack.rend()) {
-        const std::size_t keep = static_cast<std::size_t>(stack.rend() - waiting) - 1;
-        while (stack.size() > keep) {
-          CloseGroup(stack);
-        }
-      }
-    } else {
-      LoadFilterParameterControls(trackItem, container(), static_cast<int>(position), component,
-                                  param, false, level());
-    }
-    while (!stack.empty() && stack.back().remaining == 0) {
-      CloseGroup(stack);
-    }
-  }
-  while (!stack.empty()) {
-    CloseGroup(stack);
-  }
+  row->SetIsMask(effect.isMask);
+  row->SetGroupLevel(effect.groupLevel);
+  AddPlannedRows(row, effect.children, trackItem, effect.masterClipEffect);
   return row;
+}
+
+void EffectControlsListView::AddPlannedRows(const std::shared_ptr<EffectItem>& parent,
+                                            const std::vector<PlannedRow>& rows,
+                                            const TrackItemRef& trackItem, bool masterClipEffect) {
+  for (const PlannedRow& planned : rows) {
+    switch (planned.kind) {
+      case PlannedRowKind::Effect:
+        parent->AddItem(MakeEffectRow(planned, trackItem));
+        break;
+      case PlannedRowKind::MaskShape:
+        if (auto shape =
+                ParameterRowFactory::CreateMaskShapeRow(this, mOwnStation, planned.component)) {
+          shape->SetGroupLevel(planned.groupLevel);
+          parent->AddItem(std::move(shape));
+        }
+        break;
+      case PlannedRowKind::CustomAudio:
+        parent->AddItem(ParameterRowFactory::CreateCustomAudioFilterRow(
+            this, mOwnStation, planned.component, planned.customAudioIndex == 1));
+        break;
+      case PlannedRowKind::Group:
+        AddGroupRow(parent, planned, trackItem, masterClipEffect);
+        break;
+      case PlannedRowKind::Parameter:
+        LoadFilterParameterControls(trackItem, parent, static_cast<int>(planned.paramIndex),
+                                    planned.component, planned.param, false, planned.groupLevel);
+        break;
+    }
+  }
+}
+
+void EffectControlsListView::AddGroupRow(const std::shared_ptr<EffectItem>& parent,
+                                         const PlannedRow& planned, const TrackItemRef& trackItem,
+                                         bool masterClipEffect) {
+  ParameterRowRequest request;
+  request.info = MakeParameterInfo(trackItem, planned.component, planned.param, masterClipEffect);
+  request.listStyle = mStyle;
+  request.componentIsMask = planned.component->IsMask();
+  std::shared_ptr<GroupBeginParameter> group = ParameterRowFactory::CreateGroupRow(request);
+  if (!group) {
+    return;
+  }
+  group->SetGroupLevel(planned.groupLevel);
+  group->SetAside(!group->IsParamVisible());
+  parent->AddItem(group);
+  AddPlannedRows(group, planned.children, trackItem, masterClipEffect);
+  // Closed: its children follow its expansion from now on.
+  group->SetIsExpanded(group->IsExpanded());
 }
 
 ParameterControlInfo EffectControlsListView::MakeParameterInfo(const TrackItemRef& trackItem,
@@ -658,15 +536,8 @@ void EffectControlsListView::LoadFilterParameterControls(
   if (!parentRow || !component || !param) {
     return;
   }
-  // An audio effect says itself which of its parameters it shows; other effects ask the hook.
-  if (component->GetMediaType() == MediaType::Audio) {
-    const auto audioInfo = AudioFilterParamInfo::ForComponent(*component);
-    const std::size_t index = component->GetParamIndex(param.get());
-    if (!audioInfo || index == 0 ||
-        !audioInfo->IsParamShown(static_cast<std::uint32_t>(index - 1))) {
-      return;
-    }
-  } else if (!ShouldAllowParameter(component, param)) {
+  // An audio effect's plan leaves out what it hides; other effects ask the hook.
+  if (component->GetMediaType() != MediaType::Audio && !ShouldAllowParameter(component, param)) {
     return;
   }
   ParameterRowRequest request;
