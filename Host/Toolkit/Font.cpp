@@ -17,6 +17,36 @@ namespace {
 constexpr std::size_t kMaxCachedLayouts = 2048;
 constexpr std::size_t kMaxCachedTextBytes = 4u << 20;
 
+// Pango measures in ints of 1/1024 pixel, so a line must stay well under 2^21 pixels. A layout
+// holds at most as many characters as could make this width at kWidestAdvance each.
+constexpr int kMaxLayoutWidth = 1 << 20;
+constexpr double kWidestAdvance = 8.0;  // em; wider than any glyph of ours or a fallback font's
+// What could show in a width: at least one em per 16 characters, which leaves room for combining
+// marks, joiners and other characters that draw narrow or nothing at all.
+constexpr double kNarrowestAdvance = 1.0 / 16;  // em
+constexpr std::string_view kEllipsis = "\xE2\x80\xA6";
+
+// The length in bytes of the first `count` characters of `text`. The cut lands before a lead
+// byte, so a UTF-8 sequence is never split; of stray continuation bytes, up to three count with
+// the character before them and each further one counts alone (it shows as U+FFFD anyway), so a
+// cut never reaches past 4 * count bytes.
+std::size_t PrefixLength(std::string_view text, std::size_t count) {
+  std::size_t characters = 0;
+  int continuations = 3;  // before any lead byte a continuation byte stands alone
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    const bool continuation = (static_cast<unsigned char>(text[i]) & 0xC0) == 0x80;
+    if (continuation && continuations < 3) {
+      ++continuations;
+      continue;
+    }
+    if (characters == count)
+      return i;
+    ++characters;
+    continuations = continuation ? 3 : 0;
+  }
+  return text.size();
+}
+
 struct Face {
   double pixelSize;
   bool bold;
@@ -77,23 +107,20 @@ class FontSystem {
     return face;
   }
 
+  // See Font::GetLayout. No layout is as wide as kMaxLayoutWidth, so a wider ellipsizeWidth
+  // gives the natural layout.
   std::shared_ptr<const TextLayout> GetLayout(int face, std::string_view text, int ellipsizeWidth) {
-    std::string key = std::to_string(face) + '\x1f' + std::to_string(ellipsizeWidth) + '\x1f';
-    key.append(text);
-    if (auto found = mIndex.find(key); found != mIndex.end()) {
-      mEntries.splice(mEntries.begin(), mEntries, found->second);
-      return found->second->layout;
+    if (ellipsizeWidth <= 0 || ellipsizeWidth >= kMaxLayoutWidth)
+      ellipsizeWidth = 0;
+    const std::size_t length = PrefixLength(text, CharacterLimit(face, ellipsizeWidth));
+    const bool cut = length < text.size();
+    if (ellipsizeWidth > 0 && !cut) {
+      // Short enough to lay out whole: when it fits, the natural layout serves both.
+      auto natural = FindOrBuild(face, text, 0, false);
+      if (natural->GetWidth() <= ellipsizeWidth)
+        return natural;
     }
-    auto layout = Build(face, text, ellipsizeWidth);
-    mEntries.push_front({key, layout});
-    mTextBytes += key.size();
-    mIndex.emplace(std::move(key), mEntries.begin());
-    while (mEntries.size() > kMaxCachedLayouts || mTextBytes > kMaxCachedTextBytes) {
-      mTextBytes -= mEntries.back().key.size();
-      mIndex.erase(mEntries.back().key);
-      mEntries.pop_back();
-    }
-    return layout;
+    return FindOrBuild(face, text.substr(0, length), ellipsizeWidth, cut);
   }
 
   std::size_t LayoutsBuilt() const { return mBuilt; }
@@ -109,6 +136,39 @@ class FontSystem {
     std::string key;
     std::shared_ptr<const TextLayout> layout;
   };
+
+  // The most characters a layout of `face` takes: what could fill ellipsizeWidth, and never more
+  // than Pango can measure.
+  std::size_t CharacterLimit(int face, int ellipsizeWidth) const {
+    const double em = mFaces[face].pixelSize;
+    const double most = std::max(256.0, std::floor(kMaxLayoutWidth / (kWidestAdvance * em)));
+    if (ellipsizeWidth <= 0)
+      return static_cast<std::size_t>(most);
+    const double fit = std::ceil(ellipsizeWidth / (kNarrowestAdvance * em)) + 1;
+    return static_cast<std::size_t>(std::min(most, fit));
+  }
+
+  // `text` is already bounded by CharacterLimit.
+  std::shared_ptr<const TextLayout> FindOrBuild(int face, std::string_view text, int ellipsizeWidth,
+                                                bool cut) {
+    std::string key =
+        std::to_string(face) + '\x1f' + std::to_string(ellipsizeWidth) + (cut ? '\x1e' : '\x1f');
+    key.append(text);
+    if (auto found = mIndex.find(key); found != mIndex.end()) {
+      mEntries.splice(mEntries.begin(), mEntries, found->second);
+      return found->second->layout;
+    }
+    auto layout = Build(face, text, ellipsizeWidth, cut);
+    mEntries.push_front({key, layout});
+    mTextBytes += key.size();
+    mIndex.emplace(std::move(key), mEntries.begin());
+    while (mEntries.size() > kMaxCachedLayouts || mTextBytes > kMaxCachedTextBytes) {
+      mTextBytes -= mEntries.back().key.size();
+      mIndex.erase(mEntries.back().key);
+      mEntries.pop_back();
+    }
+    return layout;
+  }
 
   FontSystem() {
     mContext = pango_font_map_create_context(pango_cairo_font_map_get_default());
@@ -152,18 +212,23 @@ class FontSystem {
     return out;
   }
 
-  std::shared_ptr<const TextLayout> Build(int face, std::string_view text, int ellipsizeWidth) {
+  // A cut text gets its "…" before Pango ellipsizes: when what is left fits the width (it may
+  // be invisible characters), the layout must still show that something was left out.
+  std::shared_ptr<const TextLayout> Build(int face, std::string_view text, int ellipsizeWidth,
+                                          bool cut) {
     ++mBuilt;
     PangoLayout* layout = pango_layout_new(mContext);
     pango_layout_set_single_paragraph_mode(layout, TRUE);
     pango_layout_set_font_description(layout, mFaces[face].description);
-    const std::string clean = Sanitize(text);
+    std::string clean = Sanitize(text);
+    if (cut)
+      clean += kEllipsis;
     pango_layout_set_text(layout, clean.data(), static_cast<int>(clean.size()));
     if (ellipsizeWidth > 0) {
       pango_layout_set_width(layout, ellipsizeWidth * PANGO_SCALE);
       pango_layout_set_ellipsize(layout, PANGO_ELLIPSIZE_END);
     }
-    return std::make_shared<const TextLayout>(layout);
+    return std::make_shared<const TextLayout>(layout, cut);
   }
 
   // Layouts still held elsewhere keep their own references to the context and font map.
@@ -218,6 +283,13 @@ int Font::StringWidth(std::string_view text) const {
   return CeilPixels(FontSystem::Get().GetLayout(mFace, text, 0)->GetWidth());
 }
 
+int Font::StringWidth(std::string_view text, int maxWidth) const {
+  if (text.empty() || maxWidth <= 0)
+    return 0;
+  const auto layout = FontSystem::Get().GetLayout(mFace, text, maxWidth);
+  return layout->IsElided() ? maxWidth : std::min(maxWidth, CeilPixels(layout->GetWidth()));
+}
+
 Size Font::MeasureString(std::string_view text) const {
   return {StringWidth(text), GetHeight()};
 }
@@ -240,11 +312,7 @@ bool Font::IsBold() const {
 }
 
 std::shared_ptr<const TextLayout> Font::GetLayout(std::string_view text, int ellipsizeWidth) const {
-  FontSystem& system = FontSystem::Get();
-  auto natural = system.GetLayout(mFace, text, 0);
-  if (ellipsizeWidth <= 0 || natural->GetWidth() <= ellipsizeWidth)
-    return natural;
-  return system.GetLayout(mFace, text, ellipsizeWidth);
+  return FontSystem::Get().GetLayout(mFace, text, ellipsizeWidth);
 }
 
 std::size_t Font::LayoutsBuilt() {

@@ -34,8 +34,13 @@ class Font {
 
   friend bool operator==(const Font& a, const Font& b) { return a.mFace == b.mFace; }
 
-  // Advance width of a single line of text, rounded up to whole pixels.
+  // Advance width of a single line of text, rounded up to whole pixels. A text too long to lay
+  // out whole (see GetLayout) measures as its laid-out part and the "…" after it.
   int StringWidth(std::string_view text) const;
+  // min(StringWidth(text), maxWidth), for a caller that never uses more than maxWidth: only what
+  // can show in maxWidth is measured, so the cost does not grow with the text. A text cut for
+  // length gives maxWidth; maxWidth <= 0 gives 0.
+  int StringWidth(std::string_view text, int maxWidth) const;
   Size MeasureString(std::string_view text) const;
   // Line height = ascent + descent, rounded up.
   int GetHeight() const;
@@ -47,6 +52,12 @@ class Font {
   // The cached layout of `text` in this font; when ellipsizeWidth > 0 and the text is wider,
   // the layout is shortened to fit with "…" at the end. Shared: the cache may drop its
   // reference at any time, the caller's stays valid.
+  //
+  // Cost: only a prefix of the text is laid out, cut between characters: with a width, 16
+  // characters per em of it (more than can show); without, as many as could make 2^20 pixels
+  // (Pango's int units overflow at 2^21). A text cut for length still ends in "…". A lookup
+  // reads no more of the text than that prefix, so a name of any length costs about what a
+  // name that fills the width does.
   std::shared_ptr<const TextLayout> GetLayout(std::string_view text, int ellipsizeWidth = 0) const;
 
   // Layout-cache statistics, for tests and benchmarks: layouts built since start, and entries

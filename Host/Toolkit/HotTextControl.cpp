@@ -236,7 +236,7 @@ void HotTextControl::PaintSelf(DC& dc) {
   const bool enabled = IsEnabledInTree();
   const Color color = ColorManager::GetColor(enabled ? kColor_HotText : kColor_ControlTextDisabled);
   const std::string text = GetDisplayText();
-  const int width = std::min(mFont.StringWidth(text), rect.Width());
+  const int width = mFont.StringWidth(text, rect.Width());
   int left = rect.left;
   if (Alignment() == TextAlign::kCenter) {
     left = rect.left + (rect.Width() - width) / 2;

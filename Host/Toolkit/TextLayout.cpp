@@ -2,7 +2,8 @@
 
 #include <algorithm>
 
-TextLayout::TextLayout(PangoLayout* layout) : mLayout(layout) {
+TextLayout::TextLayout(PangoLayout* layout, bool cut)
+    : mLayout(layout), mElided(cut || pango_layout_is_ellipsized(layout)) {
   PangoRectangle ink;
   PangoRectangle logical;
   pango_layout_get_extents(mLayout, &ink, &logical);
@@ -10,7 +11,8 @@ TextLayout::TextLayout(PangoLayout* layout) : mLayout(layout) {
   mHeight = static_cast<double>(logical.height) / PANGO_SCALE;
   mBaseline = static_cast<double>(pango_layout_get_baseline(mLayout)) / PANGO_SCALE;
   mInkLeft = std::min(0.0, static_cast<double>(ink.x) / PANGO_SCALE);
-  mInkRight = std::max(mWidth, static_cast<double>(ink.x + ink.width) / PANGO_SCALE);
+  // Summed in double: a wide line's x + width may not fit an int.
+  mInkRight = std::max(mWidth, (static_cast<double>(ink.x) + ink.width) / PANGO_SCALE);
 }
 
 TextLayout::~TextLayout() {

@@ -6,7 +6,8 @@
 // Pango layout. Toolkit-internal: only the toolkit's .cpp files include this header.
 class TextLayout {
  public:
-  explicit TextLayout(PangoLayout* layout);  // adopts the reference
+  // Adopts the reference. `cut`: the text was shortened before it was laid out.
+  TextLayout(PangoLayout* layout, bool cut);
   ~TextLayout();
   TextLayout(const TextLayout&) = delete;
   TextLayout& operator=(const TextLayout&) = delete;
@@ -19,6 +20,8 @@ class TextLayout {
   // Ink extents can reach outside the logical box (e.g. italics, accents).
   double GetInkLeft() const { return mInkLeft; }
   double GetInkRight() const { return mInkRight; }
+  // True when the layout shows less than its text, ending in "…".
+  bool IsElided() const { return mElided; }
 
  private:
   PangoLayout* mLayout;
@@ -27,4 +30,5 @@ class TextLayout {
   double mBaseline = 0;
   double mInkLeft = 0;
   double mInkRight = 0;
+  bool mElided = false;
 };

@@ -1,6 +1,9 @@
 #include <gtest/gtest.h>
+#include <pango/pango.h>
 
+#include <limits>
 #include <string>
+#include <string_view>
 
 #include "Host/Toolkit/Font.h"
 #include "Host/Toolkit/TextLayout.h"
@@ -94,6 +97,111 @@ TEST(FontLayoutCache, TheCacheIsBounded) {
   EXPECT_EQ(Font::CachedLayoutCount(), 0u);
   EXPECT_GT(held->GetWidth(), 0.0);
   EXPECT_GT(font.StringWidth("after clear"), 0);
+}
+
+// --- Texts of any length ---
+// A clip name of 10 MB was laid out whole on every paint: seconds each, and its width in
+// Pango's int units (1/1024 px) overflowed.
+
+constexpr std::string_view kEllipsis = "\xE2\x80\xA6";
+
+std::string TextOf(const TextLayout& layout) {
+  return pango_layout_get_text(layout.GetPangoLayout());
+}
+
+int CharactersOf(const TextLayout& layout) {
+  return pango_layout_get_character_count(layout.GetPangoLayout());
+}
+
+TEST(FontLongText, AHugeTextMeasuresWithoutOverflowAndShowsItWasCut) {
+  const std::string huge(10'000'000, 'W');
+  for (const Font& font : {Font(), Font(512.0, true), Font(1.0, false)}) {
+    const int width = font.StringWidth(huge);
+    EXPECT_GE(width, font.StringWidth(std::string(200, 'W'))) << font.GetPixelSize();
+    EXPECT_LT(width, 1 << 21) << "beyond 2^21 px Pango's units overflow";
+    const auto layout = font.GetLayout(huge);
+    EXPECT_TRUE(layout->IsElided());
+    EXPECT_TRUE(TextOf(*layout).ends_with(kEllipsis));
+    EXPECT_GT(layout->GetInkRight(), 0.0);
+  }
+}
+
+TEST(FontLongText, AHugeTextElidesToItsWidthLikeAMerelyLongOne) {
+  const Font font;
+  const std::string huge(10'000'000, 'x');
+  const auto elided = font.GetLayout(huge, 300);
+  EXPECT_TRUE(elided->IsElided());
+  EXPECT_LE(elided->GetWidth(), 300.5);
+  EXPECT_LT(CharactersOf(*elided), 10'000) << "only what can show is laid out";
+  const auto longOne = font.GetLayout(std::string(2000, 'x'), 300);
+  EXPECT_TRUE(longOne->IsElided());
+  EXPECT_DOUBLE_EQ(elided->GetWidth(), longOne->GetWidth());
+  EXPECT_DOUBLE_EQ(elided->GetInkRight(), longOne->GetInkRight());
+  // The bounded measurement agrees with the whole one wherever the whole one fits.
+  EXPECT_EQ(font.StringWidth(huge, 300), 300);
+  EXPECT_EQ(font.StringWidth("Beach.mov", 300), font.StringWidth("Beach.mov"));
+  EXPECT_EQ(font.StringWidth("Beach.mov", 20), 20);
+  EXPECT_EQ(font.StringWidth("Beach.mov", 0), 0);
+  EXPECT_EQ(font.StringWidth("Beach.mov", -5), 0);
+  // A width beyond any layout gives the whole (bounded) layout.
+  EXPECT_EQ(font.GetLayout(huge, std::numeric_limits<int>::max()), font.GetLayout(huge));
+}
+
+TEST(FontLongText, ACutNeverSplitsACharacter) {
+  const Font font;
+  // Two-, three- and four-byte characters, and a mix, after 0 to 3 bytes of ASCII so that the
+  // cut meets every byte position of a sequence.
+  for (const std::string_view unit :
+       {"\xC3\xA9", "\xE2\x82\xAC", "\xF0\x9F\x98\x80", "a\xC3\xA9\xE2\x82\xAC\xF0\x9F\x98\x80"}) {
+    for (int shift = 0; shift < 4; ++shift) {
+      std::string text(static_cast<std::size_t>(shift), 'a');
+      while (text.size() < 200'000) {
+        text += unit;
+      }
+      for (const int width : {0, 150}) {
+        const auto layout = font.GetLayout(text, width);
+        const std::string shown = TextOf(*layout);
+        ASSERT_TRUE(layout->IsElided());
+        ASSERT_TRUE(shown.ends_with(kEllipsis));
+        const std::string_view kept(shown.data(), shown.size() - kEllipsis.size());
+        EXPECT_TRUE(g_utf8_validate(kept.data(), static_cast<gssize>(kept.size()), nullptr));
+        EXPECT_EQ(kept.find("\xEF\xBF\xBD"), std::string_view::npos) << "a split shows as U+FFFD";
+        EXPECT_TRUE(std::string_view(text).starts_with(kept)) << "the kept part is a prefix";
+        EXPECT_GT(kept.size(), 0u);
+      }
+    }
+  }
+}
+
+TEST(FontLongText, RunsOfStrayBytesAreCutLikeCharacters) {
+  const Font font;
+  const std::string stray(1'000'000, '\x80');
+  for (const std::string& text : {stray, "\xF0" + stray, "A" + stray}) {
+    const auto layout = font.GetLayout(text);
+    EXPECT_TRUE(layout->IsElided());
+    EXPECT_LT(CharactersOf(*layout), 100'000);
+    EXPECT_GT(font.StringWidth(text), 0);
+    EXPECT_LE(font.GetLayout(text, 100)->GetWidth(), 100.5);
+  }
+}
+
+TEST(FontLongText, AHugeTextsLayoutIsCachedAndEqualsAFreshOne) {
+  const Font font;
+  const std::string huge(10'000'000, 'x');
+  const auto first = font.GetLayout(huge, 240);
+  const auto built = Font::LayoutsBuilt();
+  EXPECT_EQ(font.GetLayout(huge, 240), first);
+  EXPECT_EQ(font.StringWidth(huge, 240), 240);
+  EXPECT_EQ(Font::LayoutsBuilt(), built) << "a repaint lays nothing out";
+  Font::ClearLayoutCache();
+  const auto fresh = font.GetLayout(huge, 240);
+  EXPECT_NE(fresh, first);
+  EXPECT_EQ(TextOf(*fresh), TextOf(*first));
+  EXPECT_DOUBLE_EQ(fresh->GetWidth(), first->GetWidth());
+  EXPECT_EQ(fresh->IsElided(), first->IsElided());
+  // Texts that differ only past what can show share the layout.
+  EXPECT_EQ(font.GetLayout(huge + "tail", 240), fresh);
+  EXPECT_NE(font.GetLayout(huge.substr(0, 40), 240), fresh);
 }
 
 }  // namespace
