@@ -72,6 +72,7 @@ void EffectControlsListHeader::PlaceExpander() {
 
 void EffectControlsListHeader::SetBoundsSelf(const Rect& /*bounds*/) {
   PlaceExpander();
+  LayOutNameRow();
 }
 
 void EffectControlsListHeader::SetNoTarget(int clipCount) {
@@ -97,9 +98,11 @@ void EffectControlsListHeader::SetClip(const SequenceRef& sequence, const TrackI
   mOutgoing.reset();
   mIncoming.reset();
   mSequenceName = sequence ? sequence->GetName() : std::string();
-  mClipName = trackItem->GetName();
+  const std::string clipName = trackItem->GetName();
   const MasterClipRef& master = trackItem->GetMasterClip();
-  mMasterClipName = master ? master->GetName() : mClipName;
+  mMasterGroupText = mMasterPrefix + mDelimiter + (master ? master->GetName() : clipName);
+  mSequenceGroupText = mSequenceName + mDelimiter + clipName;
+  LayOutNameRow();
   Invalidate();
 }
 
@@ -122,6 +125,7 @@ void EffectControlsListHeader::SetTransition(const SequenceRef& sequence,
   mIncoming = incoming;
   mSequenceName = sequence ? sequence->GetName() : std::string();
   mTransitionText = transition->GetName();
+  mTransitionLine = mSequenceName + mDelimiter + mTransitionText;
   Invalidate();
 }
 
@@ -140,20 +144,12 @@ void EffectControlsListHeader::EnableExpander(bool enable) {
   }
 }
 
-std::string EffectControlsListHeader::GetMasterGroupText() const {
-  return mMasterPrefix + mDelimiter + mMasterClipName;
-}
-
-std::string EffectControlsListHeader::GetSequenceGroupText() const {
-  return mSequenceName + mDelimiter + mClipName;
-}
-
 std::string EffectControlsListHeader::GetDisplayText() const {
   switch (mDisplayMode) {
     case kModeClip:
       return GetMasterGroupText() + "  " + GetSequenceGroupText();
     case kModeTransition:
-      return mSequenceName + mDelimiter + mTransitionText;
+      return mTransitionLine;
     default:
       return mSeveralClips ? mSeveralClipsText : mNoTargetText;
   }
@@ -166,23 +162,19 @@ Rect EffectControlsListHeader::GetTextRect() const {
 
 // The name row: the master group from the left, the sequence group after it, the uses zone at
 // the right end. Each group is a triangle plus its text, truncated to share the row.
-Rect EffectControlsListHeader::GetMasterZoneRect() const {
+void EffectControlsListHeader::LayOutNameRow() {
   const Rect text = GetTextRect();
+  const int height = mFont.GetHeight();
   const int available = std::max(0, text.Width() - kUsesZoneWidth - kGroupGap);
-  const int wanted = kTriangleWidth + mFont.StringWidth(GetMasterGroupText());
-  const int sequenceWanted = kTriangleWidth + mFont.StringWidth(GetSequenceGroupText());
+  // Neither group can be wider than the row, so neither text is measured beyond it.
+  const int wanted = kTriangleWidth + mFont.StringWidth(mMasterGroupText, available);
+  const int sequenceWanted = kTriangleWidth + mFont.StringWidth(mSequenceGroupText, available);
   // Each group gets at least half of the row; what one does not need, the other may use.
   const int width = std::min(wanted, std::max(available / 2, available - sequenceWanted));
-  return Rect{text.left, text.top, text.left + width, text.top + mFont.GetHeight()};
-}
-
-Rect EffectControlsListHeader::GetSequenceZoneRect() const {
-  const Rect text = GetTextRect();
-  const Rect master = GetMasterZoneRect();
-  const int left = master.right + kGroupGap;
+  mMasterZone = Rect{text.left, text.top, text.left + width, text.top + height};
+  const int left = mMasterZone.right + kGroupGap;
   const int right = std::max(left, text.right - kUsesZoneWidth);
-  const int wanted = kTriangleWidth + mFont.StringWidth(GetSequenceGroupText());
-  return Rect{left, text.top, std::min(right, left + wanted), text.top + mFont.GetHeight()};
+  mSequenceZone = Rect{left, text.top, std::min(right, left + sequenceWanted), text.top + height};
 }
 
 Rect EffectControlsListHeader::GetUsesZoneRect() const {
@@ -194,10 +186,10 @@ EffectControlsListHeader::Zone EffectControlsListHeader::HitTestZone(Point point
   if (mDisplayMode != kModeClip) {
     return kZoneNone;
   }
-  if (GetMasterZoneRect().Contains(point)) {
+  if (mMasterZone.Contains(point)) {
     return kZoneMaster;
   }
-  if (GetSequenceZoneRect().Contains(point)) {
+  if (mSequenceZone.Contains(point)) {
     return kZoneSequence;
   }
   if (GetUsesZoneRect().Contains(point)) {
@@ -221,17 +213,17 @@ void EffectControlsListHeader::PaintSelf(DC& dc) {
   switch (mDisplayMode) {
     case kModeClip: {
       const Color link = ColorManager::GetColor(kColor_InteractiveControl);
-      const Rect master = GetMasterZoneRect();
-      const Rect sequence = GetSequenceZoneRect();
+      const Rect& master = mMasterZone;
+      const Rect& sequence = mSequenceZone;
       const Color masterColor = mShowingMasterClip ? textColor : link;
       const Color sequenceColor = mShowingMasterClip ? link : textColor;
       DrawTriangle(dc, master, masterColor);
-      dc.DrawText(GetMasterGroupText(),
+      dc.DrawText(mMasterGroupText,
                   Rect{master.left + kTriangleWidth, master.top, master.right, master.bottom},
                   mFont, masterColor);
       DrawTriangle(dc, sequence, sequenceColor);
       dc.DrawText(
-          GetSequenceGroupText(),
+          mSequenceGroupText,
           Rect{sequence.left + kTriangleWidth, sequence.top, sequence.right, sequence.bottom},
           mFont, sequenceColor);
       // The uses popup: a small down-pointing triangle at the right end of the row.
@@ -245,7 +237,7 @@ void EffectControlsListHeader::PaintSelf(DC& dc) {
       break;
     }
     case kModeTransition:
-      dc.DrawText(mSequenceName + mDelimiter + mTransitionText, text, mFont, textColor);
+      dc.DrawText(mTransitionLine, text, mFont, textColor);
       break;
     default:
       dc.DrawText(mSeveralClips ? mSeveralClipsText : mNoTargetText, text, mFont, textColor);

@@ -60,9 +60,10 @@ class EffectControlsListHeader : public SubView {
   bool IsShowingMasterClip() const { return mShowingMasterClip; }
   // The text the header shows, as one line (the two groups joined by two spaces in clip mode).
   std::string GetDisplayText() const;
-  // The master group ("Master * name") and the sequence group ("sequence * clip").
-  std::string GetMasterGroupText() const;
-  std::string GetSequenceGroupText() const;
+  // The master group ("Master * name") and the sequence group ("sequence * clip") of the last
+  // clip set.
+  const std::string& GetMasterGroupText() const { return mMasterGroupText; }
+  const std::string& GetSequenceGroupText() const { return mSequenceGroupText; }
   MultiPictureButton* GetExpander() const { return mExpander.get(); }
 
   // Called by a click on the master group (match frame): the panel shows the master clip.
@@ -89,8 +90,8 @@ class EffectControlsListHeader : public SubView {
 
  private:
   Rect GetTextRect() const;
-  Rect GetMasterZoneRect() const;
-  Rect GetSequenceZoneRect() const;
+  // Places the name row's groups; when the clip or the bounds change, not per paint.
+  void LayOutNameRow();
   Rect GetUsesZoneRect() const;
   void PlaceExpander();
   void MatchFrame();
@@ -112,9 +113,14 @@ class EffectControlsListHeader : public SubView {
   std::string mMasterPrefix;
   std::string mDelimiter;
   std::string mTransitionText;
-  std::string mMasterClipName;
-  std::string mClipName;
   std::string mSequenceName;
+  // The texts the header draws, made when the target is set: names may be megabytes long.
+  std::string mMasterGroupText;
+  std::string mSequenceGroupText;
+  std::string mTransitionLine;
+  // The name row's groups, each a triangle and its text (local coordinates).
+  Rect mMasterZone;
+  Rect mSequenceZone;
   Font mFont;
   std::vector<Use> mUses;  // of the last uses popup
   std::function<void(const MasterClipRef&)> mMasterClipHandler;

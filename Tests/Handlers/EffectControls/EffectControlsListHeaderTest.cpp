@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <cstdlib>
 #include <memory>
 #include <string>
 #include <vector>
@@ -13,6 +15,9 @@
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/TransitionData.h"
+#include "Host/Toolkit/DC.h"
+#include "Host/Toolkit/Font.h"
+#include "Host/Toolkit/Image.h"
 #include "Host/Toolkit/MenuTracker.h"
 #include "Host/Toolkit/MultiPictureButton.h"
 #include "Host/Toolkit/ScriptedMenuTracker.h"
@@ -104,6 +109,60 @@ TEST_F(ListHeaderTest, LongNamesShareTheRowWithoutOverlapping) {
     }
   }
   EXPECT_EQ(changes, 3);
+}
+
+// A clip named with 10 MB: the header measured the whole name on every paint (seconds each,
+// and its width overflowed Pango's int units), and the sequence group lost its text.
+TEST_F(ListHeaderTest, AHugeNameIsElidedInItsGroupLikeAMerelyLongOne) {
+  const auto zones = [&] {
+    std::string row;
+    for (int x = 0; x < 400; ++x) {
+      row += static_cast<char>('0' + header->HitTestZone(Point{x, 20}));
+    }
+    return row;
+  };
+  const auto paint = [&] {
+    Image image(Size{400, 34});
+    DC dc(image);
+    header->PaintSelf(dc);
+    return image;
+  };
+  const auto sameImage = [](const Image& a, const Image& b) {
+    for (int y = 0; y < 34; ++y) {
+      for (int x = 0; x < 400; ++x) {
+        if (a.GetPixel(x, y) != b.GetPixel(x, y)) {
+          return ::testing::AssertionFailure() << "differs at " << x << "," << y;
+        }
+      }
+    }
+    return ::testing::AssertionSuccess();
+  };
+
+  master->SetName(std::string(2000, 'M'));
+  clip->SetName(std::string(2000, 'C'));
+  header->SetClip(sequence, clip);
+  const std::string longZones = zones();
+  const Image longImage = paint();
+  clip->SetName("");
+  header->SetClip(sequence, clip);
+  const Image unnamedImage = paint();
+
+  master->SetName(std::string(10'000'000, 'M'));
+  clip->SetName(std::string(10'000'000, 'C'));
+  header->SetClip(sequence, clip);
+  EXPECT_EQ(zones(), longZones);
+  const auto masterWidth = std::count(longZones.begin(), longZones.end(), '1');
+  const auto sequenceWidth = std::count(longZones.begin(), longZones.end(), '2');
+  EXPECT_GT(masterWidth, 100);
+  EXPECT_LE(std::abs(masterWidth - sequenceWidth), 1) << "two long names share the row evenly";
+  const Image hugeImage = paint();
+  EXPECT_TRUE(sameImage(hugeImage, longImage));
+  EXPECT_FALSE(sameImage(hugeImage, unnamedImage)) << "the clip's name shows";
+  const auto built = Font::LayoutsBuilt();
+  paint();
+  header->HitTestZone(Point{100, 20});
+  EXPECT_EQ(Font::LayoutsBuilt(), built) << "a repaint lays nothing out";
+  EXPECT_EQ(header->GetSequenceGroupText().size(), 10'000'000 + std::string("Edit * ").size());
 }
 
 TEST_F(ListHeaderTest, ToolTipsNameTheGroupUnderThePointer) {
