@@ -47,6 +47,10 @@ constexpr std::array<Color, 8> kMarkerColors{Color(0x5C, 0xB8, 0x5C), Color(0xD9
 constexpr int kMinorTickSpacing = 6;
 constexpr int kNumberlessSpacing = 40;
 
+TickTime LimitTime(TickTime time) {
+  return std::clamp(time, kTime_Min, kTime_Max);
+}
+
 }  // namespace
 
 TimeBarControl::TimeBarControl(const Rect& bounds, Commander* commander) : SubView(commander) {
@@ -65,6 +69,8 @@ void TimeBarControl::SetTimeRange(TickTime start, TickTime end) {
   if (!HOST_VERIFY(end >= start, "Invalid Min/Max Time")) {
     return;
   }
+  start = LimitTime(start);
+  end = LimitTime(end);
   mStart = start;
   mEnd = end;
   Invalidate();
@@ -72,6 +78,8 @@ void TimeBarControl::SetTimeRange(TickTime start, TickTime end) {
 }
 
 void TimeBarControl::SetZoomInOutTime(TickTime zoomIn, TickTime zoomOut) {
+  zoomIn = LimitTime(zoomIn);
+  zoomOut = LimitTime(zoomOut);
   if (!HOST_VERIFY(zoomOut > zoomIn, "Invalid zoom range")) {
     return;
   }
@@ -153,7 +161,8 @@ double TimeBarControl::GetTicksPerPixel() const {
 
 int TimeBarControl::TimeToPixel(TickTime time) const {
   const Int128 span = static_cast<Int128>(mZoomOut) - mZoomIn;
-  return Saturate<int>(FloorDiv((static_cast<Int128>(time) - mZoomIn) * Width(), span));
+  const Int128 x = FloorDiv((static_cast<Int128>(time) - mZoomIn) * Width(), span);
+  return static_cast<int>(std::clamp<Int128>(x, -kMaxPixel, kMaxPixel));
 }
 
 TickTime TimeBarControl::PixelToTime(int x) const {
@@ -188,7 +197,8 @@ TickTime TimeBarControl::GetMajorTickInterval() const {
   const std::array<TickTime, 14> frameSteps{1,   2,   5,    10,   20,   50,    100,
                                             200, 500, 1000, 2000, 5000, 10000, 20000};
   for (const TickTime frames : frameSteps) {
-    if (frames * frame < kTicksPerSecond) {
+    // frames * frame < one second, without the product: a slow rate's frame is near kTime_Max.
+    if (frame <= (kTicksPerSecond - 1) / frames) {
       candidates.push_back(frames * frame);
     }
   }
@@ -206,10 +216,13 @@ TickTime TimeBarControl::GetMajorTickInterval() const {
       return candidate;
     }
   }
-  // Zoomed out beyond the longest step: whole multiples of it.
+  // Zoomed out beyond the longest step: whole multiples of it, up to the largest that is a time.
+  // Past that (a view of 2^62 ticks on a few pixels) the numbers may crowd; the ticks still
+  // fall on whole multiples and the count of ticks drawn stays bounded.
   const TickTime longest = candidates.back();
-  const auto multiple = static_cast<TickTime>(std::ceil(needed * ticksPerPixel / longest));
-  return longest * std::max<TickTime>(1, multiple);
+  const double multiple = std::ceil(needed * ticksPerPixel / static_cast<double>(longest));
+  const TickTime most = kTime_Max / longest;
+  return longest * static_cast<TickTime>(std::clamp(multiple, 1.0, static_cast<double>(most)));
 }
 
 // --- Gestures ---
@@ -420,19 +433,18 @@ void TimeBarControl::HideSelf() {
 }
 
 bool TimeBarControl::SetZoomFromUser(TickTime zoomIn, TickTime zoomOut, bool keepSpan) {
-  const TickTime range = SubtractTimes(mEnd, mStart);
-  TickTime span = SubtractTimes(zoomOut, zoomIn);
+  // In 128 bits: the range from kTime_Min to kTime_Max is wider than kTime_Max, and a span
+  // saturated there would change the zoom of a view that is only slid.
+  const Int128 range = static_cast<Int128>(mEnd) - mStart;
+  Int128 span = static_cast<Int128>(zoomOut) - zoomIn;
   if (!keepSpan) {
-    span = std::max(span, std::min(GetMinimumZoomSpan(), std::max<TickTime>(range, 1)));
+    span = std::max(span, std::min<Int128>(GetMinimumZoomSpan(), std::max<Int128>(range, 1)));
   }
-  span = std::max<TickTime>(span, 1);
-  TickTime in = zoomIn;
-  if (range >= span) {
-    in = std::clamp(in, mStart, SubtractTimes(mEnd, span));
-  } else {
-    in = mStart;
-  }
-  const TickTime out = AddTimes(in, span);
+  span = std::max<Int128>(span, 1);
+  const TickTime in = range >= span
+                          ? static_cast<TickTime>(std::clamp<Int128>(zoomIn, mStart, mEnd - span))
+                          : mStart;
+  const auto out = static_cast<TickTime>(std::min<Int128>(in + span, kTime_Max));
   if (in == mZoomIn && out == mZoomOut) {
     return false;
   }
@@ -441,8 +453,15 @@ bool TimeBarControl::SetZoomFromUser(TickTime zoomIn, TickTime zoomOut, bool kee
 }
 
 bool TimeBarControl::ScrollByPixels(int pixels) {
-  const auto shift = static_cast<TickTime>(std::llround(pixels * GetTicksPerPixel()));
-  if (!SetZoomFromUser(AddTimes(mZoomIn, shift), AddTimes(mZoomOut, shift), true)) {
+  // The slide is limited to the time range before it is added, so that neither end of the view
+  // saturates (which would change its span); a far slide is a double beyond 64 bits.
+  const Int128 lowest = std::min<Int128>(0, static_cast<Int128>(mStart) - mZoomIn);
+  const Int128 highest = std::max<Int128>(0, static_cast<Int128>(mEnd) - mZoomOut);
+  const double wanted = std::clamp(pixels * GetTicksPerPixel(), static_cast<double>(lowest),
+                                   static_cast<double>(highest));
+  const Int128 shift = std::clamp<Int128>(static_cast<Int128>(std::round(wanted)), lowest, highest);
+  if (!SetZoomFromUser(static_cast<TickTime>(mZoomIn + shift),
+                       static_cast<TickTime>(mZoomOut + shift), true)) {
     return false;
   }
   const std::shared_ptr<const void> alive = KeepAliveForDispatch();
@@ -482,8 +501,8 @@ void TimeBarControl::PaintTicks(DC& dc) const {
   const Int128 first = CeilDiv(shownStart, minor) * minor - mZeroPoint;
   const Font font(kFont_Small);
   const FrameRate& rate = GetDisplayRate();
-  const int maxTicks = 4 * Width() + 4;
-  int count = 0;
+  const std::int64_t maxTicks = 4 * std::int64_t{Width()} + 4;
+  std::int64_t count = 0;
   for (Int128 t = first; t <= mZoomOut && count < maxTicks; t += minor, ++count) {
     const auto time = static_cast<TickTime>(t);
     const int x = TimeToPixel(time);

@@ -32,8 +32,8 @@ struct TimeBarMarker {
 // visible part within the whole range.
 //
 // Mapping: the bar's width covers [zoom in, zoom out]; TimeToPixel rounds down and PixelToTime
-// gives the first tick of a pixel, so TimeToPixel(PixelToTime(x)) == x for every x while a
-// pixel spans at least one tick. Coordinates are the bar's own.
+// gives the first tick of a pixel, so TimeToPixel(PixelToTime(x)) == x for every |x| <=
+// kMaxPixel while a pixel spans at least one tick. Coordinates are the bar's own.
 //
 // Gestures, reported on the bar's station (ControlMessages.h): dragging anywhere moves the
 // current time (EditTimeChanging at the press and on moves, EditTimeChanged at the release;
@@ -54,6 +54,9 @@ class TimeBarControl : public SubView {
   static constexpr int kMarkStripHeight = 4;
   // Height of the band at the top where markers sit.
   static constexpr int kMarkerBandHeight = 7;
+  // TimeToPixel stays within +-kMaxPixel, so a shape a few pixels around any time can be drawn
+  // without overflowing an int (the DC takes coordinates this far out).
+  static constexpr int kMaxPixel = 1 << 30;
 
   static int GetDefaultSmallHeight() { return kDefaultSmallHeight; }
 
@@ -63,6 +66,8 @@ class TimeBarControl : public SubView {
   const StationName& GetStation() const { return mStation.GetName(); }
 
   // --- Times (ticks) ---
+  // The time range and the zoom are limited to [kTime_Min, kTime_Max], so that their spans and
+  // the ticks between them fit 64 bits; other times (current, marks, markers) may be anything.
   // The times that exist; end < start is refused with the debug assertion "Invalid Min/Max Time".
   void SetTimeRange(TickTime start, TickTime end);
   TickTime GetStartTime() const { return mStart; }

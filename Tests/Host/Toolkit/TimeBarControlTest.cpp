@@ -1,5 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <limits>
+#include <string>
+
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Toolkit/TimeBarControl.h"
 #include "Tests/Host/Toolkit/ControlTestSupport.h"
@@ -211,6 +214,73 @@ TEST_F(TimeBarControlTest, PaintsInsideItsBoundsWithEverythingShown) {
   bar->SetAudioTimeUnits(true);
   bar->SetZeroPoint(3600 * kSecond);
   EXPECT_TRUE(PaintsOnlyInside(kBounds));
+}
+
+// A clip of about 2^62 ticks zoomed out on a narrow ruler: the tick spacing, a multiple of
+// the longest step, overflowed 64 bits.
+TEST_F(TimeBarControlTest, AHugeRangeZoomedOutOnANarrowBarHasTicksThatAreTimes) {
+  constexpr TickTime kHuge = TickTime{1} << 62;
+  constexpr TickTime kTwelveHours = 43200 * kSecond;
+  const Rect narrow = Rect::FromSize(kBounds.left, kBounds.top, 30, kBounds.Height());
+  bar->SetBounds(narrow);
+  bar->SetTimeRange(0, kHuge);
+  bar->SetZoomInOutTime(0, kHuge);
+  for (const bool numbers : {true, false}) {
+    bar->SetShowNumbers(numbers);
+    const TickTime interval = bar->GetMajorTickInterval();
+    EXPECT_GT(interval, 0);
+    EXPECT_LE(interval, kTime_Max);
+    EXPECT_EQ(interval % kTwelveHours, 0);
+    EXPECT_TRUE(PaintsOnlyInside(narrow));
+  }
+}
+
+// Times beyond the sentinels are limited to them; the whole range of times is wider than the
+// largest time, which the pan's shift and the zoom's span must not saturate or wrap.
+TEST_F(TimeBarControlTest, TheWholeRangeOfTimesCanBeViewedAndPanned) {
+  constexpr TickTime kLowest = std::numeric_limits<TickTime>::min();
+  constexpr TickTime kHighest = std::numeric_limits<TickTime>::max();
+  bar->SetTimeRange(kLowest, kHighest);
+  bar->SetZoomInOutTime(kLowest, kHighest);
+  EXPECT_EQ(bar->GetStartTime(), kTime_Min);
+  EXPECT_EQ(bar->GetEndTime(), kTime_Max);
+  EXPECT_EQ(bar->GetZoomInTime(), kTime_Min);
+  EXPECT_EQ(bar->GetZoomOutTime(), kTime_Max);
+  EXPECT_GT(bar->GetMajorTickInterval(), 0);
+  EXPECT_TRUE(PaintsOnlyInside(kBounds));
+  EXPECT_FALSE(bar->ScrollByPixels(1000)) << "the view is the whole range";
+
+  bar->SetZoomInOutTime(kTime_Min, 0);
+  recorder.lines.clear();
+  EXPECT_TRUE(bar->ScrollByPixels(100000));
+  EXPECT_EQ(bar->GetZoomInTime(), 0);
+  EXPECT_EQ(bar->GetZoomOutTime(), kTime_Max);
+  EXPECT_EQ(recorder.lines, Lines{"SlideZoom 0 " + N(kTime_Max)});
+  EXPECT_TRUE(bar->ScrollByPixels(-100000));
+  EXPECT_EQ(bar->GetZoomInTime(), kTime_Min);
+  EXPECT_EQ(bar->GetZoomOutTime(), 0);
+}
+
+// One tick per pixel: times at the sentinels map billions of pixels away, and the marks' and
+// markers' shapes around them overflowed an int.
+TEST_F(TimeBarMarkerTest, MarksAndMarkersFarOutsideAFineViewPaintAndHitTest) {
+  bar->SetTimeRange(kTime_Min, kTime_Max);
+  bar->SetZoomInOutTime(0, 200);
+  bar->SetInOutMarks(kTime_Min, kTime_Max);
+  bar->SetMarkers({TimeBarMarker{1, kTime_Min, 2 * kTime_Max, 2, ""},
+                   TimeBarMarker{2, kTime_Max, 0, 3, ""}, TimeBarMarker{3, kTime_Min, 0, 4, ""}});
+  EXPECT_EQ(bar->TimeToPixel(kTime_Max), TimeBarControl::kMaxPixel);
+  EXPECT_EQ(bar->TimeToPixel(kTime_Min), -TimeBarControl::kMaxPixel);
+  EXPECT_TRUE(PaintsOnlyInside(kBounds));
+  Click({kBounds.left + 100, kBounds.top + 3});
+  EXPECT_EQ(selected, 1) << "the long marker spans the view";
+  // Near the marks' handles, but they are far off: the press moves the current time.
+  Drag({kBounds.left + 100, kBounds.top + 16}, {kBounds.left + 150, kBounds.top + 16});
+  EXPECT_EQ(bar->GetInMark(), kTime_Min);
+  EXPECT_EQ(bar->GetOutMark(), kTime_Max);
+  for (const std::string& line : recorder.lines) {
+    EXPECT_EQ(line.rfind("Mark", 0), std::string::npos) << line;
+  }
 }
 
 TEST_F(TimeBarControlTest, TheCurrentTimeIndicatorIsDrawnAtItsPixel) {
