@@ -112,56 +112,22 @@ constexpr CommandEntry kCommands[] = {
     {"cmd.effectcontrols.xoeditabletextexpander", 19050, 3, ""},
 };
 
-constexpr std::array<Decal, EffectControlsHandler::kKeyframeImageCount> kKeyframeImageDecals = {
-    kEffectControlsKeyLinearNormalDecal,
-    kEffectControlsKeyLinearFirstNormalDecal,
-    kEffectControlsKeyLinearLastNormalDecal,
-    kEffectControlsKeyLinearSelectedDecal,
-    kEffectControlsKeyLinearFirstSelectedDecal,
-    kEffectControlsKeyLinearLastSelectedDecal,
-    kEffectControlsKeyBezierNormalDecal,
-    kEffectControlsKeyBezierFirstNormalDecal,
-    kEffectControlsKeyBezierLastNormalDecal,
-    kEffectControlsKeyBezierSelectedDecal,
-    kEffectControlsKeyBezierFirstSelectedDecal,
-    kEffectControlsKeyBezierLastSelectedDecal,
-    kEffectControlsKeyAutoBezierNormalDecal,
-    kEffectControlsKeyAutoBezierFirstNormalDecal,
-    kEffectControlsKeyAutoBezierLastNormalDecal,
-    kEffectControlsKeyAutoBezierSelectedDecal,
-    kEffectControlsKeyAutoBezierFirstSelectedDecal,
-    kEffectControlsKeyAutoBezierLastSelectedDecal,
-    kEffectControlsKeyHoldNormalDecal,
-    kEffectControlsKeyHoldFirstNormalDecal,
-    kEffectControlsKeyHoldLastNormalDecal,
-    kEffectControlsKeyHoldSelectedDecal,
-    kEffectControlsKeyHoldFirstSelectedDecal,
-    kEffectControlsKeyHoldLastSelectedDecal,
-    kEffectControlsKeyEaseInNormalDecal,
-    kEffectControlsKeyEaseInFirstNormalDecal,
-    kEffectControlsKeyEaseInLastNormalDecal,
-    kEffectControlsKeyEaseInSelectedDecal,
-    kEffectControlsKeyEaseInFirstSelectedDecal,
-    kEffectControlsKeyEaseInLastSelectedDecal,
-    kEffectControlsKeyEaseOutNormalDecal,
-    kEffectControlsKeyEaseOutFirstNormalDecal,
-    kEffectControlsKeyEaseOutLastNormalDecal,
-    kEffectControlsKeyEaseOutSelectedDecal,
-    kEffectControlsKeyEaseOutFirstSelectedDecal,
-    kEffectControlsKeyEaseOutLastSelectedDecal,
-    kEffectControlsKeyTRDualControlPointNormalDecal,
-    kEffectControlsKeyTRDualControlPointSelectedDecal,
-    kEffectControlsKeyTRLeftControlPointNormalDecal,
-    kEffectControlsKeyTRLeftControlPointSelectedDecal,
-    kEffectControlsKeyTRRightControlPointNormalDecal,
-    kEffectControlsKeyTRRightControlPointSelectedDecal,
-    kEffectControlsKeyTRHoldControlPointNormalDecal,
-    kEffectControlsKeyTRHoldControlPointSelectedDecal,
-    kEffectControlsKeyTRDualHoldRightNormalDecal,
-    kEffectControlsKeyTRDualHoldRightSelectedDecal,
-    kEffectControlsKeyTRDualHoldLeftNormalDecal,
-    kEffectControlsKeyTRDualHoldLeftSelectedDecal,
-};
+// The keyframe glyphs are one run of the decal list, already in image-list order.
+constexpr Decal kFirstKeyframeDecal = kEffectControlsKeyLinearNormalDecal;
+constexpr Decal kLastKeyframeDecal = kEffectControlsKeyTRDualHoldLeftSelectedDecal;
+static_assert(kLastKeyframeDecal - kFirstKeyframeDecal + 1 ==
+              EffectControlsHandler::kKeyframeImageCount);
+
+constexpr std::array<Decal, EffectControlsHandler::kKeyframeImageCount> MakeKeyframeImageDecals() {
+  std::array<Decal, EffectControlsHandler::kKeyframeImageCount> decals{};
+  for (int i = 0; i < EffectControlsHandler::kKeyframeImageCount; ++i) {
+    decals[i] = static_cast<Decal>(kFirstKeyframeDecal + i);
+  }
+  return decals;
+}
+
+constexpr std::array<Decal, EffectControlsHandler::kKeyframeImageCount> kKeyframeImageDecals =
+    MakeKeyframeImageDecals();
 
 EffectControlsHandler* gInstance = nullptr;
 
