@@ -50,6 +50,26 @@ void SetSource(cairo_t* cr, Color color, double alpha = 1.0) {
                         color.a / 255.0 * alpha);
 }
 
+// Adds a rectangle in target pixels (64-bit, already clipped to the target) to the path.
+void AddRectangle(cairo_t* cr, const RectL& rect) {
+  cairo_rectangle(cr, static_cast<double>(rect.left), static_cast<double>(rect.top),
+                  static_cast<double>(rect.right - rect.left),
+                  static_cast<double>(rect.bottom - rect.top));
+}
+
+// Fills a rectangle in target pixels with the current operator.
+void FillTargetRect(cairo_t* cr, const RectL& rect, Color color) {
+  SetSource(cr, color);
+  AddRectangle(cr, rect);
+  cairo_fill(cr);
+}
+
+// `rect` in view coordinates, in the target's pixels: 64-bit, so far-off rects do not wrap.
+RectL InTarget(const Rect& rect, Point origin) {
+  return {std::int64_t{rect.left} + origin.x, std::int64_t{rect.top} + origin.y,
+          std::int64_t{rect.right} + origin.x, std::int64_t{rect.bottom} + origin.y};
+}
+
 // Liang-Barsky: clips the segment a-b to `box`; false when nothing is left.
 bool ClipSegment(PointD& a, PointD& b, double left, double top, double right, double bottom) {
   const double dx = b.x - a.x;
@@ -204,8 +224,7 @@ Rect DC::GetClipBox() const {
 }
 
 void DC::PushClip(const Rect& rect) {
-  const RectL abs{std::int64_t{rect.left} + mOrigin.x, std::int64_t{rect.top} + mOrigin.y,
-                  std::int64_t{rect.right} + mOrigin.x, std::int64_t{rect.bottom} + mOrigin.y};
+  const RectL abs = InTarget(rect, mOrigin);
   const RectL clipped = abs.Intersect(ClipInTarget());
   mClipStack.push_back(clipped.IsEmpty() ? Rect{} : ToRect(clipped));
   ApplyClip();
@@ -241,16 +260,9 @@ DC::ScopedState::~ScopedState() {
 void DC::FillRect(const Rect& rect, Color color) {
   if (mCairo == nullptr || color.a == 0)
     return;
-  const RectL abs{std::int64_t{rect.left} + mOrigin.x, std::int64_t{rect.top} + mOrigin.y,
-                  std::int64_t{rect.right} + mOrigin.x, std::int64_t{rect.bottom} + mOrigin.y};
-  const RectL visible = abs.Intersect(ClipInTarget());
-  if (visible.IsEmpty())
-    return;
-  SetSource(mCairo, color);
-  cairo_rectangle(mCairo, static_cast<double>(visible.left), static_cast<double>(visible.top),
-                  static_cast<double>(visible.right - visible.left),
-                  static_cast<double>(visible.bottom - visible.top));
-  cairo_fill(mCairo);
+  const RectL visible = InTarget(rect, mOrigin).Intersect(ClipInTarget());
+  if (!visible.IsEmpty())
+    FillTargetRect(mCairo, visible, color);
 }
 
 void DC::ClearRect(const Rect& rect, Color color) {
@@ -258,16 +270,9 @@ void DC::ClearRect(const Rect& rect, Color color) {
     return;
   cairo_save(mCairo);
   cairo_set_operator(mCairo, CAIRO_OPERATOR_SOURCE);
-  const RectL abs{std::int64_t{rect.left} + mOrigin.x, std::int64_t{rect.top} + mOrigin.y,
-                  std::int64_t{rect.right} + mOrigin.x, std::int64_t{rect.bottom} + mOrigin.y};
-  const RectL visible = abs.Intersect(ClipInTarget());
-  if (!visible.IsEmpty()) {
-    SetSource(mCairo, color);
-    cairo_rectangle(mCairo, static_cast<double>(visible.left), static_cast<double>(visible.top),
-                    static_cast<double>(visible.right - visible.left),
-                    static_cast<double>(visible.bottom - visible.top));
-    cairo_fill(mCairo);
-  }
+  const RectL visible = InTarget(rect, mOrigin).Intersect(ClipInTarget());
+  if (!visible.IsEmpty())
+    FillTargetRect(mCairo, visible, color);
   cairo_restore(mCairo);
 }
 
@@ -314,11 +319,7 @@ void DC::DrawLine(Point from, Point to, Color color, int width) {
     const RectL visible = line.Intersect(ClipInTarget());
     if (visible.IsEmpty())
       return;
-    SetSource(mCairo, color);
-    cairo_rectangle(mCairo, static_cast<double>(visible.left), static_cast<double>(visible.top),
-                    static_cast<double>(visible.right - visible.left),
-                    static_cast<double>(visible.bottom - visible.top));
-    cairo_fill(mCairo);
+    FillTargetRect(mCairo, visible, color);
     return;
   }
   const Point points[2] = {from, to};
@@ -482,8 +483,7 @@ void DC::DrawText(std::string_view text, const Rect& rect, const Font& font, Col
                   TextAlign align, TextVAlign valign) {
   if (mCairo == nullptr || color.a == 0 || text.empty() || rect.IsEmpty())
     return;
-  const RectL abs{std::int64_t{rect.left} + mOrigin.x, std::int64_t{rect.top} + mOrigin.y,
-                  std::int64_t{rect.right} + mOrigin.x, std::int64_t{rect.bottom} + mOrigin.y};
+  const RectL abs = InTarget(rect, mOrigin);
   const RectL visible = abs.Intersect(ClipInTarget());
   if (visible.IsEmpty())
     return;
@@ -515,9 +515,7 @@ void DC::DrawText(std::string_view text, const Rect& rect, const Font& font, Col
     return;
   }
   cairo_save(mCairo);
-  cairo_rectangle(mCairo, static_cast<double>(visible.left), static_cast<double>(visible.top),
-                  static_cast<double>(visible.right - visible.left),
-                  static_cast<double>(visible.bottom - visible.top));
+  AddRectangle(mCairo, visible);
   cairo_clip(mCairo);
   SetSource(mCairo, color);
   cairo_move_to(mCairo, x, y);
@@ -575,8 +573,7 @@ void DC::DrawImage(const Image& image, Point topLeft, double alpha) {
 void DC::DrawImage(const Image& image, const Rect& dest, double alpha) {
   if (mCairo == nullptr || image.IsEmpty() || dest.IsEmpty() || !(alpha > 0.0))
     return;
-  const RectL abs{std::int64_t{dest.left} + mOrigin.x, std::int64_t{dest.top} + mOrigin.y,
-                  std::int64_t{dest.right} + mOrigin.x, std::int64_t{dest.bottom} + mOrigin.y};
+  const RectL abs = InTarget(dest, mOrigin);
   const RectL visible = abs.Intersect(ClipInTarget());
   if (visible.IsEmpty())
     return;
@@ -591,9 +588,7 @@ void DC::DrawImage(const Image& image, const Rect& dest, double alpha) {
   const double offsetX = static_cast<double>(visible.left - abs.left) / sx;
   const double offsetY = static_cast<double>(visible.top - abs.top) / sy;
   cairo_save(mCairo);
-  cairo_rectangle(mCairo, static_cast<double>(visible.left), static_cast<double>(visible.top),
-                  static_cast<double>(visible.right - visible.left),
-                  static_cast<double>(visible.bottom - visible.top));
+  AddRectangle(mCairo, visible);
   cairo_clip(mCairo);
   cairo_translate(mCairo, static_cast<double>(visible.left), static_cast<double>(visible.top));
   cairo_scale(mCairo, sx, sy);
@@ -635,8 +630,7 @@ void DC::BitBlt(const Rect& dest, const DC& source, Point sourceTopLeft) {
 void DC::BitBlt(const Rect& dest, const Image& source, Point sourceTopLeft) {
   if (mCairo == nullptr || source.IsEmpty() || dest.IsEmpty())
     return;
-  const RectL abs{std::int64_t{dest.left} + mOrigin.x, std::int64_t{dest.top} + mOrigin.y,
-                  std::int64_t{dest.right} + mOrigin.x, std::int64_t{dest.bottom} + mOrigin.y};
+  const RectL abs = InTarget(dest, mOrigin);
   // Only the part that has source pixels behind it is copied.
   const Size sourceSize = source.GetLogicalSize();
   const std::int64_t shiftX = abs.left - sourceTopLeft.x;
