@@ -50,6 +50,18 @@ ComponentRef ComponentChain::FindByMatchName(std::string_view matchName) const {
   return nullptr;
 }
 
+std::vector<ComponentRef> ComponentChain::ApplicableEffects(
+    const std::vector<ComponentRef>& effects) const {
+  std::vector<ComponentRef> applicable;
+  for (const ComponentRef& effect : effects) {
+    if (effect && !effect->IsIntrinsic() && !effect->IsMask() &&
+        effect->GetMediaType() == mMediaType) {
+      applicable.push_back(effect);
+    }
+  }
+  return applicable;
+}
+
 void ComponentChain::SetComponents(std::vector<ComponentRef> components) {
   std::set<const Component*> seen;
   for (const ComponentRef& component : components) {

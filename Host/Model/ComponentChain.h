@@ -31,6 +31,9 @@ class ComponentChain : public ModelObject {
   int GetComponentIndexInChain(const Component* component) const { return GetIndexOf(component); }
   const std::vector<ComponentRef>& GetComponents() const { return mComponents; }
   ComponentRef FindByMatchName(std::string_view matchName) const;
+  // Of `effects`, those a user may apply to this chain, in order: effects (not intrinsics, not
+  // masks) of the chain's media type.
+  std::vector<ComponentRef> ApplicableEffects(const std::vector<ComponentRef>& effects) const;
 
   // Replaces the whole list: components that leave lose their chain, those that arrive leave the
   // chain they were in (without a message there: callers that move between chains set both) and

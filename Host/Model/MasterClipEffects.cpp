@@ -11,26 +11,10 @@
 #include "Host/Model/MasterClip.h"
 #include "Host/Model/Project.h"
 
-namespace {
-
-std::vector<ComponentRef> Applicable(const ComponentChain& chain,
-                                     const std::vector<ComponentRef>& effects) {
-  std::vector<ComponentRef> applicable;
-  for (const ComponentRef& effect : effects) {
-    if (effect && !effect->IsIntrinsic() && !effect->IsMask() &&
-        effect->GetMediaType() == chain.GetMediaType()) {
-      applicable.push_back(effect);
-    }
-  }
-  return applicable;
-}
-
-}  // namespace
-
 bool MasterClipEffects::QueryApplyEffects(const MasterClipRef& clip,
                                           const std::vector<ComponentRef>& effects) {
   return clip && !EditPermissions::IsReadOnly(*clip) &&
-         !Applicable(*clip->GetVideoChain(), effects).empty();
+         !clip->GetVideoChain()->ApplicableEffects(effects).empty();
 }
 
 EditStatus MasterClipEffects::ApplyEffects(const MasterClipRef& clip,
@@ -50,7 +34,7 @@ EditStatus MasterClipEffects::InsertEffects(const MasterClipRef& clip,
     return EditStatus::ReadOnly;
   }
   const ComponentChainRef& chain = clip->GetVideoChain();
-  const std::vector<ComponentRef> applicable = Applicable(*chain, effects);
+  const std::vector<ComponentRef> applicable = chain->ApplicableEffects(effects);
   if (applicable.empty()) {
     return EditStatus::InvalidArgument;
   }

@@ -31,18 +31,6 @@ bool IsEditable(const TrackItemRef& item) {
   return item && item->GetSequence() && !EditPermissions::IsReadOnly(*item);
 }
 
-std::vector<ComponentRef> Applicable(const TrackItem& item,
-                                     const std::vector<ComponentRef>& effects) {
-  std::vector<ComponentRef> applicable;
-  for (const ComponentRef& effect : effects) {
-    if (effect && !effect->IsIntrinsic() && !effect->IsMask() &&
-        effect->GetMediaType() == item.GetMediaType()) {
-      applicable.push_back(effect);
-    }
-  }
-  return applicable;
-}
-
 EditStatus InsertEffects(const TrackItemRef& item, const std::vector<ComponentRef>& effects,
                          int index, const char* name) {
   if (!HOST_VERIFY(item != nullptr, "Invalid TrackItem")) {
@@ -54,7 +42,8 @@ EditStatus InsertEffects(const TrackItemRef& item, const std::vector<ComponentRe
   if (EditPermissions::IsReadOnly(*item)) {
     return EditStatus::ReadOnly;
   }
-  const std::vector<ComponentRef> applicable = Applicable(*item, effects);
+  const std::vector<ComponentRef> applicable =
+      item->GetComponentChain()->ApplicableEffects(effects);
   if (applicable.empty()) {
     return EditStatus::InvalidArgument;
   }
@@ -181,7 +170,7 @@ EditStatus SequenceActions::RemoveItems(const std::vector<TrackItemRef>& items) 
 bool SequenceActions::QueryApplyTrackItemEffects(const TrackItemRef& item,
                                                  const std::vector<ComponentRef>& effects) {
   return item && item->IsClip() && !EditPermissions::IsReadOnly(*item) &&
-         !Applicable(*item, effects).empty();
+         !item->GetComponentChain()->ApplicableEffects(effects).empty();
 }
 
 EditStatus SequenceActions::ApplyTrackItemEffects(const TrackItemRef& item,
