@@ -1,10 +1,13 @@
 #include "Host/Toolkit/TextEditBuffer.h"
 
+#include <glib.h>
+#include <pango/pango.h>
+
 #include <algorithm>
-#include <cstdlib>
 
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/Font.h"
+#include "Host/Toolkit/TextLayout.h"
 
 namespace {
 
@@ -14,34 +17,29 @@ bool IsContinuationByte(unsigned char c) {
   return (c & 0xC0) == 0x80;
 }
 
-// Complete, well-formed UTF-8 (no overlongs checks beyond the lead byte ranges).
+// Well-formed UTF-8 only (no overlong forms, surrogates or NUL bytes), as the rest of the host
+// stores and saves.
 bool IsValidUTF8(std::string_view text) {
-  std::size_t i = 0;
-  while (i < text.size()) {
-    const auto c = static_cast<unsigned char>(text[i]);
-    std::size_t length = 0;
-    if (c < 0x80) {
-      length = 1;
-    } else if (c >= 0xC2 && c <= 0xDF) {
-      length = 2;
-    } else if (c >= 0xE0 && c <= 0xEF) {
-      length = 3;
-    } else if (c >= 0xF0 && c <= 0xF4) {
-      length = 4;
-    } else {
-      return false;
-    }
-    if (i + length > text.size()) {
-      return false;
-    }
-    for (std::size_t k = 1; k < length; ++k) {
-      if (!IsContinuationByte(static_cast<unsigned char>(text[i + k]))) {
-        return false;
-      }
-    }
-    i += length;
+  return g_utf8_validate(text.data(), static_cast<gssize>(text.size()), nullptr);
+}
+
+// The cursor position of `text` nearest to `x` (pixels from the text's left), as Pango places
+// cursors (between graphemes): one layout for the whole text, not a measurement per prefix.
+std::size_t NearestCursorPosition(std::string_view text, int x, const Font& font) {
+  if (text.empty()) {
+    return 0;
   }
-  return true;
+  const auto layout = font.GetLayout(text);
+  PangoLayout* pango = layout->GetPangoLayout();
+  constexpr int kFarthest = 1 << 20;  // Pango units are int: stay far from their limit
+  int index = 0;
+  int trailing = 0;
+  pango_layout_xy_to_index(pango, std::clamp(x, -kFarthest, kFarthest) * PANGO_SCALE, 0, &index,
+                           &trailing);
+  const char* laidOut = pango_layout_get_text(pango);
+  const char* position = g_utf8_offset_to_pointer(laidOut + index, trailing);
+  // A long text is laid out cut short: a click past the cut lands at the cut.
+  return std::min(static_cast<std::size_t>(position - laidOut), text.size());
 }
 
 }  // namespace
@@ -195,18 +193,7 @@ int TextEditBuffer::TextLeft(const Rect& rect, const Font& font, TextAlign align
 }
 
 void TextEditBuffer::SetCaretFromX(int x, const Font& font, bool extendSelection) {
-  std::size_t best = 0;
-  int bestDistance = std::abs(x);
-  std::size_t offset = 0;
-  while (offset < mText.size()) {
-    offset = NextBoundary(offset);
-    const int distance = std::abs(font.StringWidth(std::string_view(mText).substr(0, offset)) - x);
-    if (distance < bestDistance) {
-      bestDistance = distance;
-      best = offset;
-    }
-  }
-  mCaret = best;
+  mCaret = NearestCursorPosition(mText, x, font);
   if (!extendSelection) {
     mAnchor = mCaret;
   }
