@@ -29,6 +29,8 @@ class EffectItem;
 class FilterItem;
 class KeyframeMultiSelection;
 class MultiPictureButton;
+class PanelTimeline;
+struct PanelTimelineChangedMessage;
 struct ParameterControlInfo;
 enum class ScrollCode : std::int32_t;
 
@@ -54,8 +56,8 @@ enum EffectControlsListViewStyle : std::uint32_t {
 // graphics, video, one per audio part), each a list of effect rows with their parameter rows
 // below. The list builds its rows from the target (the selected clip's linked video and audio
 // items, a transition, or a master clip's own effects), places and paints them, keeps the
-// effect and parameter selections and the keyframe selection the keyframe area edits, and the
-// time state the keyframe area draws with.
+// effect and parameter selections and the keyframe selection the keyframe area edits. Its rows
+// and the keyframe area read the edit time and zoom from the panel's PanelTimeline.
 //
 // Ownership: always held by a std::shared_ptr (the panel view owns it); the list owns its rows
 // (section lists and audio parts) and its buttons (child views). Rows are rebuilt, never
@@ -97,8 +99,10 @@ class EffectControlsListView : public SubView, public Listener {
 
   // `parent`: where the list's commands go that it does not handle (the panel view; not owned).
   // `ownStation`: where the list's messages go out (and the rows report); the list listens
-  // there too. Registers the keyframe station.
-  EffectControlsListView(Commander* parent, StationName ownStation);
+  // there too. Registers the keyframe station. `timeline`: the panel's time state, shared with
+  // the panel view that owns it; null gives the list one of its own (a list on its own).
+  EffectControlsListView(Commander* parent, StationName ownStation,
+                         std::shared_ptr<PanelTimeline> timeline = nullptr);
   ~EffectControlsListView() override;
 
   // --- Style ---
@@ -221,8 +225,9 @@ class EffectControlsListView : public SubView, public Listener {
   void ClearSelection();
 
   // --- Edit time ---
-  // The edit line in sequence time; every parameter row reads it.
-  TickTime GetEditTime() const { return *mEditTime; }
+  // The edit line in sequence time (the timeline's); every parameter row reads it.
+  TickTime GetEditTime() const;
+  const PanelTimeline& GetTimeline() const { return *mTimeline; }
 
   // --- Layout and scrolling ---
   // Places every row and section button for the current scroll offset.
@@ -262,15 +267,15 @@ class EffectControlsListView : public SubView, public Listener {
   void OnDisclosureStateChanged();
   void OnDisclosureStateAllChanged(bool expanded);
 
-  // --- Shared time state (written by the panel view, read by the keyframe area) ---
+  // --- Keyframe area zoom (the timeline's; see PanelTimeline) ---
   // Each returns false and changes nothing when the value is the stored one. A time per pixel
   // that is not a positive number is refused (false).
   bool SetTimePerPixel(double secondsPerPixel);
   bool SetVisibleKeyframeTime(TickTime time);
-  double GetTimePerPixel() const { return mTimePerPixel; }
-  TickTime GetVisibleKeyframeTime() const { return mVisibleKeyframeTime; }
+  double GetTimePerPixel() const;
+  TickTime GetVisibleKeyframeTime() const;
   // One frame of this rate lasts one pixel of the keyframe area.
-  const FrameRate& GetPixelFrameRate() const { return mPixelFrameRate; }
+  const FrameRate& GetPixelFrameRate() const;
 
   // --- State dump ---
   // Every row in display order (sections top to bottom, each row before its children) with
@@ -314,6 +319,9 @@ class EffectControlsListView : public SubView, public Listener {
 
  private:
   void ListenTo(const StationName& station);
+  void OnTimelineChanged(const PanelTimelineChangedMessage& change);
+  // Rows whose values were read at another time read them again.
+  void SyncRowsToTime(bool force);
   void StopListeningTo(const StationName& station);
   void NewKeyframeSelection();
   void FinishAndShowRows(const EffectItemList& list);
@@ -355,7 +363,8 @@ class EffectControlsListView : public SubView, public Listener {
   StationName mOwnStation;
   StationName mKeyframeStation;
   std::shared_ptr<KeyframeMultiSelection> mKeyframeSelection;
-  std::shared_ptr<TickTime> mEditTime;
+  // Shared with the panel view, which owns it, and (its edit time) with the rows.
+  std::shared_ptr<PanelTimeline> mTimeline;
   TickTime mTrackItemStart = 0;
   TickTime mTrackItemMediaIn = 0;
   int mScrollOffset = 0;
@@ -372,10 +381,6 @@ class EffectControlsListView : public SubView, public Listener {
   EffectControlsListScroller* mScroller = nullptr;  // not owned; see SetEffectControlsView
   int mVideoHeaderTop = -1;
   int mGraphicsHeaderTop = -1;
-
-  TickTime mVisibleKeyframeTime = 0;
-  double mTimePerPixel = 0.0;
-  FrameRate mPixelFrameRate;
 
   // The selection the list was last built for, and whether a build ran since the last clear.
   std::vector<TrackItemGroup> mTargetSelection;

@@ -3,13 +3,12 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 
 #include <algorithm>
-#include <cmath>
-#include <limits>
 #include <utility>
 
 #include "Handlers/EffectControls/Src/AudioPartInfo.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ComponentChainActions.h"
@@ -74,20 +73,21 @@ void AppendDumpRows(const std::shared_ptr<EffectItem>& row, std::vector<std::str
 
 }  // namespace
 
-EffectControlsListView::EffectControlsListView(Commander* parent, StationName ownStation)
+EffectControlsListView::EffectControlsListView(Commander* parent, StationName ownStation,
+                                               std::shared_ptr<PanelTimeline> timeline)
     : SubView(parent),
       mOwnStation(std::move(ownStation)),
-      mEditTime(std::make_shared<TickTime>(0)),
+      mTimeline(timeline ? std::move(timeline) : std::make_shared<PanelTimeline>()),
       mNormalFont(kFont_Normal),
       mLabelFont(kFont_Normal) {
   mKeyframeStation = RegisterUniqueStation(mOwnStation + ".Keyframes");
   RegisterStation(mOwnStation);
   for (const StationName& station :
        {mOwnStation, StationName(kSequenceActivationStation),
-        StationName(kVideoFilterNotifierStation), StationName(kTextControlResizeStation)}) {
+        StationName(kVideoFilterNotifierStation), StationName(kTextControlResizeStation),
+        mTimeline->GetStation()}) {
     AddListener(station, *this);
   }
-  SetTimePerPixel(1.0 / 25.0);
 }
 
 EffectControlsListView::~EffectControlsListView() {
@@ -132,7 +132,7 @@ void EffectControlsListView::SetSequence(const SequenceRef& sequence) {
   mSequence = sequence;
   if (mSequence) {
     ListenTo(mSequence->GetStation());
-    *mEditTime = mSequence->GetCurrentTime();
+    mTimeline->SetEditTime(mSequence->GetCurrentTime());
   }
 }
 
@@ -187,7 +187,7 @@ void EffectControlsListView::DoSequenceClipSelectionChanged(const SequenceRef& s
                           groups == mTargetSelection && mBuilt && mMasterClip == mBuiltMasterClip;
   mTargetSelection = std::move(groups);
   if (sameTarget) {
-    UpdateParamsUI(*mEditTime, true);
+    UpdateParamsUI(GetEditTime(), true);
     Invalidate();
     return;
   }
@@ -291,7 +291,9 @@ void EffectControlsListView::AutoSelectNthEmbeddedEffect() {
 // --- Messages and commands ---
 
 void EffectControlsListView::ListenToMessage(const Message& message) {
-  if (message.Is<EffectControlsDisclosureStateChanged>()) {
+  if (const auto* time = message.As<PanelTimelineChangedMessage>()) {
+    OnTimelineChanged(*time);
+  } else if (message.Is<EffectControlsDisclosureStateChanged>()) {
     OnDisclosureStateChanged();
   } else if (const auto* all = message.As<DisclosureStateAllChanged>()) {
     OnDisclosureStateAllChanged(all->expanded);
@@ -422,39 +424,39 @@ void EffectControlsListView::StopListeningTo(const StationName& station) {
   }
 }
 
-// --- Shared time state ---
+// --- Time ---
+
+TickTime EffectControlsListView::GetEditTime() const {
+  return mTimeline->GetEditTime();
+}
 
 bool EffectControlsListView::SetTimePerPixel(double secondsPerPixel) {
-  // Zero, negative or NaN would make every pixel last no time at all (or less): refused.
-  if (!(secondsPerPixel > 0.0)) {
-    return false;
-  }
-  if (secondsPerPixel == mTimePerPixel) {
-    return false;
-  }
-  mTimePerPixel = secondsPerPixel;
-  const double pixelsPerSecond = 1.0 / secondsPerPixel;
-  TickTime ticks = std::numeric_limits<TickTime>::max();
-  if (pixelsPerSecond != 0.0) {
-    const double exact = std::trunc(static_cast<double>(kTicksPerSecond) / pixelsPerSecond);
-    // Finer than one tick a pixel cannot be counted in whole ticks; huge spans saturate.
-    ticks = exact < 1.0 ? 1
-            : exact >= static_cast<double>(std::numeric_limits<TickTime>::max())
-                ? std::numeric_limits<TickTime>::max()
-                : static_cast<TickTime>(exact);
-  }
-  mPixelFrameRate = FrameRate::FromTicksPerFrame(ticks).value_or(FrameRate());
-  Invalidate();
-  return true;
+  return mTimeline->SetSecondsPerPixel(secondsPerPixel);
 }
 
 bool EffectControlsListView::SetVisibleKeyframeTime(TickTime time) {
-  if (time == mVisibleKeyframeTime) {
-    return false;
+  return mTimeline->SetVisibleStart(time);
+}
+
+double EffectControlsListView::GetTimePerPixel() const {
+  return mTimeline->GetSecondsPerPixel();
+}
+
+TickTime EffectControlsListView::GetVisibleKeyframeTime() const {
+  return mTimeline->GetVisibleStart();
+}
+
+const FrameRate& EffectControlsListView::GetPixelFrameRate() const {
+  return mTimeline->GetPixelFrameRate();
+}
+
+void EffectControlsListView::OnTimelineChanged(const PanelTimelineChangedMessage& change) {
+  if (change.Has(PanelTimeline::kEditTimeChanged)) {
+    SyncRowsToTime(false);
   }
-  mVisibleKeyframeTime = time;
-  Invalidate();
-  return true;
+  if (change.Has(PanelTimeline::kZoomChanged) || change.Has(PanelTimeline::kVisibleStartChanged)) {
+    Invalidate();
+  }
 }
 
 // --- State dump ---

@@ -9,6 +9,7 @@
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Handlers/EffectControls/Src/FilterItemOptions.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/Station.h"
@@ -193,7 +194,11 @@ void EffectControlsListView::FinishAndShowRows(const EffectItemList& list) {
 }
 
 void EffectControlsListView::UpdateParamsUI(TickTime editTime, bool force) {
-  *mEditTime = editTime;
+  mTimeline->SetEditTime(editTime);
+  SyncRowsToTime(force);
+}
+
+void EffectControlsListView::SyncRowsToTime(bool force) {
   ForEachTopRow(
       [force](const std::shared_ptr<EffectItem>& row) { row->RecursiveSynchToTime(force); });
 }
@@ -314,7 +319,7 @@ void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
   if (mGraphicsExpander && !mGraphicsItems.IsEmpty()) {
     mGraphicsExpander->Show();
   }
-  UpdateParamsUI(*mEditTime, true);
+  UpdateParamsUI(GetEditTime(), true);
 }
 
 // --- Audio clip ---
@@ -484,7 +489,7 @@ void EffectControlsListView::RebuildTransitionComponentView(
     row->FinishCreateSelf();
     row->Show();
   }
-  UpdateParamsUI(*mEditTime, true);
+  UpdateParamsUI(GetEditTime(), true);
 }
 
 void EffectControlsListView::LoadVideoTransition(const TrackItemRef& trackItem) {
@@ -646,7 +651,7 @@ ParameterControlInfo EffectControlsListView::MakeParameterInfo(const TrackItemRe
   info.param = param;
   // Master-clip effects keep their keyframes in the clip's own time.
   info.trackItem = masterClipMode ? nullptr : trackItem;
-  info.editTime = mEditTime;
+  info.editTime = PanelTimeline::ShareEditTime(mTimeline);
   info.readOnly = IsReadOnlyEffectContainer();
   return info;
 }

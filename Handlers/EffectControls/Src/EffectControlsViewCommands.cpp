@@ -4,6 +4,7 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Localization.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentActions.h"
@@ -94,12 +95,13 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
   if (!mSequence) {
     return false;
   }
+  const TickTime editLine = mTimeline->GetEditTime();
   switch (command) {
     case kMarkInCommand:
-      SequencePropertyActions::SetInPoint(mSequence, SnapToFrame(mEditLine));
+      SequencePropertyActions::SetInPoint(mSequence, SnapToFrame(editLine));
       return true;
     case kMarkOutCommand: {
-      const TickTime out = std::min(SnapToFrame(mEditLine), mRuler->GetEndTime());
+      const TickTime out = std::min(SnapToFrame(editLine), mRuler->GetEndTime());
       SequencePropertyActions::SetOutPoint(mSequence, out);
       return true;
     }
@@ -121,10 +123,10 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
       SequencePropertyActions::SetInOutPoints(mSequence, std::nullopt, std::nullopt);
       return true;
     case kAddMarkerCommand:
-      mMarkers.AddAt(mEditLine, 0);
+      mMarkers.AddAt(editLine, 0);
       return true;
     case kClearMarkerCommand:
-      mMarkers.RemoveSelectedAt(mEditLine);
+      mMarkers.RemoveSelectedAt(editLine);
       return true;
     case kClearAllMarkersCommand:
       mMarkers.ClearAll();
@@ -133,7 +135,7 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
     case kNextMarkerCommand:
     case kPreviousMarkerCommand: {
       const auto time =
-          command == kNextMarkerCommand ? mMarkers.Next(mEditLine) : mMarkers.Previous(mEditLine);
+          command == kNextMarkerCommand ? mMarkers.Next(editLine) : mMarkers.Previous(editLine);
       if (time) {
         SetEditTime(*time);
         mMarkers.SelectAt(*time);
@@ -143,12 +145,12 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
     }
     case kEditMarkerCommand:
       // The host has no marker editor yet: the marker at the edit line is selected for it.
-      mMarkers.SelectAt(mEditLine);
+      mMarkers.SelectAt(editLine);
       mRuler->Invalidate();
       return true;
     default:
       if (command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand) {
-        mMarkers.AddAt(mEditLine, command - kFirstColoredMarkerCommand);
+        mMarkers.AddAt(editLine, command - kFirstColoredMarkerCommand);
         return true;
       }
       return false;
@@ -304,21 +306,22 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
       ToggleKeyframesVisible();
       return true;
     case kZoomInCommand:
-      ZoomToTimePerPixel(mTimePerPixel * 0.5, true);
+      ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel() * 0.5, true);
       return true;
     case kZoomOutCommand:
-      ZoomToTimePerPixel(mTimePerPixel * 2.0, true);
+      ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel() * 2.0, true);
       return true;
     case kPinToClipCommand:
       if (mTargetMode == kTargetClip) {
         mPinned = !mPinned;
         mKeyframeView->SetPinToClip(mPinned);
         SetupTimeBarZoomMinMax(mSelectedGroups);
-        const int K = std::max(1, mZoomLimiter.GetScrollWidth());
+        const int width = std::max(1, mZoomLimiter.GetScrollWidth());
         const TickTime span = mRuler->GetZoomOutTime() - mRuler->GetZoomInTime();
-        // Forces the re-application: the same value would keep the range as it is.
-        mTimePerPixel = -1.0;
-        ZoomToTimePerPixel(static_cast<double>(span) / kTicksPerSecond / K, true);
+        // The new limits place the range around the edit line even at the same zoom.
+        ApplyZoom(
+            mZoomLimiter.ClampTimePerPixel(static_cast<double>(span) / kTicksPerSecond / width),
+            true);
       }
       return true;
     case kAudioTimeUnitsCommand:
@@ -397,8 +400,8 @@ void EffectControlsView::SetAudioTimeUnits(bool audioUnits) {
   ReloadTimeDisplays();
   mRuler->SetAudioTimeUnits(audioUnits);
   // The list's audio frame alignment arrives with the keyframe area's audio-unit snapping.
-  if (mKeyframesVisible && mTimePerPixel > 0.0) {
-    ZoomToTimePerPixel(mTimePerPixel, false);
+  if (mKeyframesVisible && mTimeline->GetSecondsPerPixel() > 0.0) {
+    ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel(), false);
   }
 }
 
