@@ -3,9 +3,11 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
+#include "Handlers/EffectControls/Public/PanelTarget.h"
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/FilterMultiSelection.h"
@@ -72,11 +74,10 @@ enum EffectControlsListViewStyle : std::uint32_t {
 // (GetKeyframeViewStation). UI thread only.
 class EffectControlsListView : public SubView, public Listener {
  public:
-  enum TargetKind : int {
-    kTargetClip = 1,
-    kTargetTransition = 2,
-    kTargetTransitionComponent = 3,  // a transition with its own effects
-  };
+  using TargetKind = PanelTarget::Kind;
+  static constexpr TargetKind kTargetClip = PanelTarget::kClip;
+  static constexpr TargetKind kTargetTransition = PanelTarget::kTransition;
+  static constexpr TargetKind kTargetTransitionComponent = PanelTarget::kTransitionComponent;
 
   static constexpr int kInitialBaseline = 0;
   static constexpr int kSectionHeaderHeight = 21;
@@ -115,26 +116,30 @@ class EffectControlsListView : public SubView, public Listener {
   // --- Target ---
   // The sequence whose selection the list shows (null: none; the list is then empty).
   void SetSequence(const SequenceRef& sequence);
-  const SequenceRef& GetSequence() const { return mSequence; }
+  const SequenceRef& GetSequence() const { return mTarget.sequence; }
   // Decides from the sequence's clip selection what to show (video, audio, a transition, a
-  // transition with its own effects) and rebuilds when that changed.
+  // transition with its own effects) and rebuilds unless the rows were built for that very
+  // target (see PanelTarget).
   void DoSequenceClipSelectionChanged(const SequenceRef& sequence);
   // Master-clip mode: the list shows the master clip's own video effects (the selected clip's
   // master clip). Takes effect at the next build.
-  void SetMasterClip(const MasterClipRef& masterClip) { mMasterClip = masterClip; }
-  bool IsViewingMasterClip() const { return mMasterClip != nullptr; }
-  const MasterClipRef& GetMasterClip() const { return mMasterClip; }
-  void ClearMasterClip() { mMasterClip.reset(); }
-  void SetTargetKind(TargetKind kind) { mTargetKind = kind; }
-  TargetKind GetTargetKind() const { return mTargetKind; }
-  void SetShowVideo(bool show) { mShowVideo = show; }
-  void SetShowAudio(bool show) { mShowAudio = show; }
-  bool GetShowVideo() const { return mShowVideo; }
-  bool GetShowAudio() const { return mShowAudio; }
+  void SetMasterClip(const MasterClipRef& masterClip) { mTarget.masterClip = masterClip; }
+  bool IsViewingMasterClip() const { return mTarget.masterClip != nullptr; }
+  const MasterClipRef& GetMasterClip() const { return mTarget.masterClip; }
+  void ClearMasterClip() { mTarget.masterClip.reset(); }
+  void SetTargetKind(TargetKind kind) { mTarget.kind = kind; }
+  TargetKind GetTargetKind() const { return mTarget.kind; }
+  void SetShowVideo(bool show) { mTarget.showVideo = show; }
+  void SetShowAudio(bool show) { mTarget.showAudio = show; }
+  bool GetShowVideo() const { return mTarget.showVideo; }
+  bool GetShowAudio() const { return mTarget.showAudio; }
   // The chain of a targeted transition that carries effects of its own
   // (kTargetTransitionComponent).
-  void SetTransitionChain(const ComponentChainRef& chain) { mTransitionChain = chain; }
-  const ComponentChainRef& GetTransitionChain() const { return mTransitionChain; }
+  void SetTransitionChain(const ComponentChainRef& chain) { mTarget.transitionChain = chain; }
+  const ComponentChainRef& GetTransitionChain() const { return mTarget.transitionChain; }
+  // What the next build shows, and what the rows were built for (none since the last clear).
+  const PanelTarget& GetTarget() const { return mTarget; }
+  const std::optional<PanelTarget>& GetBuiltTarget() const { return mBuiltTarget; }
   // The effects of the master clip's chain are read only, or the sequence is.
   bool IsReadOnlyEffectContainer() const;
 
@@ -324,6 +329,8 @@ class EffectControlsListView : public SubView, public Listener {
   void SyncRowsToTime(bool force);
   void StopListeningTo(const StationName& station);
   void NewKeyframeSelection();
+  // What `groups` (the sequence's clip selection) asks the list to show.
+  PanelTarget ChooseTarget(std::vector<TrackItemGroup> groups) const;
   void FinishAndShowRows(const EffectItemList& list);
   // The one layout walk behind PositionItems and GetMaxHeight: section headers and top rows
   // from the top of the content down; `sink` (null: only measure) receives the placements.
@@ -339,24 +346,22 @@ class EffectControlsListView : public SubView, public Listener {
                                          const ComponentRef& component,
                                          const ComponentParamRef& param, bool masterClipMode) const;
 
-  TargetKind mTargetKind = kTargetTransition;
+  // What the selection chose (and the next build shows).
+  PanelTarget mTarget;
+  // What the rows were built for; empty after ClearList.
+  std::optional<PanelTarget> mBuiltTarget;
   bool mVideoExpanded = false;
   bool mTextExpanded = false;
   bool mGraphicsExpanded = false;
-  bool mShowVideo = false;
-  bool mShowAudio = false;
   EffectItemList mVideoItems;
   EffectItemList mGraphicsItems;
   std::vector<std::shared_ptr<AudioPartInfo>> mAudioParts;
   FilterMultiSelection::Selection mSelectedFilters;
   ParameterMultiSelection::Selection mSelectedParameters;
-  SequenceRef mSequence;
-  MasterClipRef mMasterClip;
   ComponentChainRef mVideoChain;
   ComponentChainRef mMasterGraphicChain;
   StationName mChainStation;
   StationName mMasterGraphicChainStation;
-  ComponentChainRef mTransitionChain;
   TrackItemRef mVideoTrackItem;
   StationName mVideoTrackItemStation;
   TrackItemRef mAudioTransitionItem;
@@ -381,12 +386,6 @@ class EffectControlsListView : public SubView, public Listener {
   EffectControlsListScroller* mScroller = nullptr;  // not owned; see SetEffectControlsView
   int mVideoHeaderTop = -1;
   int mGraphicsHeaderTop = -1;
-
-  // The selection the list was last built for, and whether a build ran since the last clear.
-  std::vector<TrackItemGroup> mTargetSelection;
-  bool mBuilt = false;
-  // The master clip the rows were built for (null: the sequence clip's own effects).
-  MasterClipRef mBuiltMasterClip;
 
   bool mPendingAutoSelect = false;
   int mPendingAutoSelectIndex = -1;

@@ -123,70 +123,24 @@ void EffectControlsListView::DestroySelf() {
 // --- Target ---
 
 void EffectControlsListView::SetSequence(const SequenceRef& sequence) {
-  if (mSequence == sequence) {
+  if (mTarget.sequence == sequence) {
     return;
   }
-  if (mSequence) {
-    StopListeningTo(mSequence->GetStation());
+  if (mTarget.sequence) {
+    StopListeningTo(mTarget.sequence->GetStation());
   }
-  mSequence = sequence;
-  if (mSequence) {
-    ListenTo(mSequence->GetStation());
-    mTimeline->SetEditTime(mSequence->GetCurrentTime());
+  mTarget.sequence = sequence;
+  if (mTarget.sequence) {
+    ListenTo(mTarget.sequence->GetStation());
+    mTimeline->SetEditTime(mTarget.sequence->GetCurrentTime());
   }
 }
 
 void EffectControlsListView::DoSequenceClipSelectionChanged(const SequenceRef& sequence) {
   SetSequence(sequence);
-  const TargetKind oldKind = mTargetKind;
-  const bool oldShowVideo = mShowVideo;
-  const bool oldShowAudio = mShowAudio;
-  const ComponentChainRef oldTransitionChain = mTransitionChain;
-
-  mShowVideo = false;
-  mShowAudio = false;
-  mTransitionChain.reset();
-  mTargetKind = kTargetClip;
-
-  std::vector<TrackItemGroup> groups;
-  if (mSequence) {
-    groups = mSequence->GetSelection();
-  }
-  if (groups.size() == 1) {
-    const TrackItemGroup& group = groups.front();
-    if (group.videoItems.size() == 1) {
-      const TrackItemRef& item = group.videoItems.front();
-      if (item->IsClip()) {
-        mShowVideo = true;
-        mShowAudio = !group.audioItems.empty();
-      } else if (item->IsTransition() && AllowsViewMode(kTransitionViewMode)) {
-        mTargetKind = kTargetTransition;
-        mShowVideo = true;
-        if (item->HasOwnComponentChain()) {
-          mTransitionChain = item->GetComponentChain();
-          mTargetKind = kTargetTransitionComponent;
-        }
-      }
-    } else if (group.videoItems.empty() && !group.audioItems.empty()) {
-      const TrackItemRef& item = group.audioItems.front();
-      if (item->IsClip()) {
-        mShowAudio = true;
-      } else if (group.audioItems.size() == 1 && item->IsTransition() &&
-                 AllowsViewMode(kTransitionViewMode)) {
-        mTargetKind = kTargetTransition;
-        mShowAudio = true;
-      }
-    }
-  } else if (IsValidLinkedTrackItems(groups)) {
-    mShowVideo = true;
-    mShowAudio = true;
-  }
-
-  const bool sameTarget = mTargetKind == oldKind && mShowVideo == oldShowVideo &&
-                          mShowAudio == oldShowAudio && mTransitionChain == oldTransitionChain &&
-                          groups == mTargetSelection && mBuilt && mMasterClip == mBuiltMasterClip;
-  mTargetSelection = std::move(groups);
-  if (sameTarget) {
+  mTarget = ChooseTarget(mTarget.sequence ? mTarget.sequence->GetSelection()
+                                          : std::vector<TrackItemGroup>());
+  if (mBuiltTarget == mTarget) {
     UpdateParamsUI(GetEditTime(), true);
     Invalidate();
     return;
@@ -194,15 +148,53 @@ void EffectControlsListView::DoSequenceClipSelectionChanged(const SequenceRef& s
   ClearAndRebuildList();
 }
 
+PanelTarget EffectControlsListView::ChooseTarget(std::vector<TrackItemGroup> groups) const {
+  PanelTarget target;
+  target.sequence = mTarget.sequence;
+  target.masterClip = mTarget.masterClip;
+  target.kind = kTargetClip;
+  if (groups.size() == 1) {
+    const TrackItemGroup& group = groups.front();
+    if (group.videoItems.size() == 1) {
+      const TrackItemRef& item = group.videoItems.front();
+      if (item->IsClip()) {
+        target.showVideo = true;
+        target.showAudio = !group.audioItems.empty();
+      } else if (item->IsTransition() && AllowsViewMode(kTransitionViewMode)) {
+        target.kind = kTargetTransition;
+        target.showVideo = true;
+        if (item->HasOwnComponentChain()) {
+          target.transitionChain = item->GetComponentChain();
+          target.kind = kTargetTransitionComponent;
+        }
+      }
+    } else if (group.videoItems.empty() && !group.audioItems.empty()) {
+      const TrackItemRef& item = group.audioItems.front();
+      if (item->IsClip()) {
+        target.showAudio = true;
+      } else if (group.audioItems.size() == 1 && item->IsTransition() &&
+                 AllowsViewMode(kTransitionViewMode)) {
+        target.kind = kTargetTransition;
+        target.showAudio = true;
+      }
+    }
+  } else if (IsValidLinkedTrackItems(groups)) {
+    target.showVideo = true;
+    target.showAudio = true;
+  }
+  target.selection = std::move(groups);
+  return target;
+}
+
 bool EffectControlsListView::IsReadOnlyEffectContainer() const {
-  if (mMasterClip) {
-    if (EditPermissions::IsReadOnly(*mMasterClip)) {
+  if (mTarget.masterClip) {
+    if (EditPermissions::IsReadOnly(*mTarget.masterClip)) {
       return true;
     }
-    return mMasterClip->GetProperties().GetBool(kPropertyKey_FromInactiveProject, false);
+    return mTarget.masterClip->GetProperties().GetBool(kPropertyKey_FromInactiveProject, false);
   }
-  if (mSequence) {
-    return EditPermissions::IsReadOnly(*mSequence);
+  if (mTarget.sequence) {
+    return EditPermissions::IsReadOnly(*mTarget.sequence);
   }
   return false;
 }

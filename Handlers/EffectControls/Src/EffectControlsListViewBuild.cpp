@@ -78,8 +78,8 @@ void CloseGroup(std::vector<OpenGroup>& stack) {
 
 void EffectControlsListView::ClearAndRebuildList() {
   ClearList();
-  if (mTargetKind == kTargetClip || mTargetKind == kTargetTransition ||
-      mTargetKind == kTargetTransitionComponent) {
+  if (mTarget.kind == kTargetClip || mTarget.kind == kTargetTransition ||
+      mTarget.kind == kTargetTransitionComponent) {
     try {
       RebuildClipOrTransitionView();
     } catch (...) {
@@ -94,8 +94,7 @@ void EffectControlsListView::ClearAndRebuildList() {
       throw;
     }
   }
-  mBuilt = true;
-  mBuiltMasterClip = mMasterClip;
+  mBuiltTarget = mTarget;
   UpdateVScrollBar();
   BroadcastListChanged();
   Invalidate();
@@ -141,30 +140,31 @@ void EffectControlsListView::ClearList() {
   }
   mVideoHeaderTop = -1;
   mGraphicsHeaderTop = -1;
-  mBuilt = false;
+  mBuiltTarget.reset();
 }
 
 void EffectControlsListView::RebuildClipOrTransitionView() {
-  if (!mSequence) {
+  if (!mTarget.sequence) {
     return;
   }
   mVideoLimiterPresent = false;
-  const std::vector<TrackItemGroup>& selection = mSequence->GetSelection();
+  const std::vector<TrackItemGroup>& selection = mTarget.sequence->GetSelection();
   if (!selection.empty()) {
     // Linked video and audio items selected as two groups are one clip.
     TrackItemGroup group = selection.front();
-    if (selection.size() == 2 && mShowVideo && mShowAudio && group.audioItems.empty()) {
+    if (selection.size() == 2 && mTarget.showVideo && mTarget.showAudio &&
+        group.audioItems.empty()) {
       group.audioItems = selection[1].audioItems;
     }
-    if (mTargetKind == kTargetTransition) {
+    if (mTarget.kind == kTargetTransition) {
       RebuildTransitionView(&group);
-    } else if (mTransitionChain) {
+    } else if (mTarget.transitionChain) {
       RebuildTransitionComponentView(&group);
     } else {
-      if (mShowVideo) {
+      if (mTarget.showVideo) {
         RebuildVideoClipView(&group);
       }
-      if (mShowAudio) {
+      if (mTarget.showAudio) {
         RebuildAudioClipView(&group);
       }
     }
@@ -183,7 +183,7 @@ void EffectControlsListView::ResetTimes() {
 }
 
 void EffectControlsListView::NewKeyframeSelection() {
-  mKeyframeSelection = std::make_shared<KeyframeMultiSelection>(mSequence);
+  mKeyframeSelection = std::make_shared<KeyframeMultiSelection>(mTarget.sequence);
 }
 
 void EffectControlsListView::FinishAndShowRows(const EffectItemList& list) {
@@ -217,8 +217,8 @@ void EffectControlsListView::RebuildVideoClipView(const TrackItemGroup* inTrackI
   const TrackItemRef item = *first;
   mVideoTrackItemStation = item->GetStation();
   ListenTo(mVideoTrackItemStation);
-  if (mMasterClip) {
-    LoadVideoFilters(item, mMasterClip->GetVideoChain(), true);
+  if (mTarget.masterClip) {
+    LoadVideoFilters(item, mTarget.masterClip->GetVideoChain(), true);
   } else {
     LoadVideoFilters(item, item->GetComponentChain(), false);
   }
@@ -227,7 +227,7 @@ void EffectControlsListView::RebuildVideoClipView(const TrackItemGroup* inTrackI
 
 void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
                                               const ComponentChainRef& chain, bool masterClipMode) {
-  mTargetKind = kTargetClip;
+  mTarget.kind = kTargetClip;
   mVideoExpanded = true;
   if (mVideoExpander) {
     mVideoExpander->SetValue(0);
@@ -334,14 +334,14 @@ void EffectControlsListView::RebuildAudioClipView(const TrackItemGroup* inTrackI
   }
   const std::vector<TrackItemRef>& items = inTrackItemGroup->audioItems;
   const TrackItemRef* first = FirstItem(items);
-  if (first == nullptr || !(*first)->IsClip() || mMasterClip) {
+  if (first == nullptr || !(*first)->IsClip() || mTarget.masterClip) {
     return;
   }
   LoadAudioFilters(items);
 }
 
 TrackItemRef EffectControlsListView::LoadAudioFilters(const std::vector<TrackItemRef>& audioItems) {
-  mTargetKind = kTargetClip;
+  mTarget.kind = kTargetClip;
   // Parts in the order of their keys. Items that share a key keep the order they came in: each
   // is a part of the clip and must not disappear from the list.
   std::vector<TrackItemRef> ordered;
@@ -445,14 +445,14 @@ void EffectControlsListView::RebuildTransitionView(const TrackItemGroup* inTrack
   if (inTrackItemGroup == nullptr) {
     return;
   }
-  if (mShowVideo) {
+  if (mTarget.showVideo) {
     const TrackItemRef* first = FirstItem(inTrackItemGroup->videoItems);
     if (first != nullptr && (*first)->IsTransition()) {
       const TrackItemRef item = *first;
       LoadVideoTransition(item);
       mVideoTrackItem = item;
     }
-  } else if (mShowAudio) {
+  } else if (mTarget.showAudio) {
     const TrackItemRef* first = FirstItem(inTrackItemGroup->audioItems);
     if (first != nullptr && (*first)->IsTransition()) {
       const TrackItemRef item = *first;
@@ -482,9 +482,9 @@ void EffectControlsListView::RebuildTransitionComponentView(
   NewKeyframeSelection();
   // The first component of the chain is the transition itself, which its row presents; the
   // next one carries the settings the transition exposes as an effect.
-  if (mTransitionChain && mTransitionChain->GetCount() > 1) {
-    auto row =
-        LoadFilter(MediaType::Video, item, mTransitionChain->GetAt(1), false, false, 0, false);
+  if (mTarget.transitionChain && mTarget.transitionChain->GetCount() > 1) {
+    auto row = LoadFilter(MediaType::Video, item, mTarget.transitionChain->GetAt(1), false, false,
+                          0, false);
     mVideoItems.AddItem(row);
     row->FinishCreateSelf();
     row->Show();
@@ -540,8 +540,8 @@ std::shared_ptr<FilterItem> EffectControlsListView::LoadFilter(MediaType mediaTy
   options.startCollapsed = HasECPStyle(kStyleStartCollapsed);
   options.noIndent = HasECPStyle(kStyleNoFilterIndent);
 
-  auto row = std::make_shared<FilterItem>(mediaType, component, trackItem, mSequence,
-                                          masterClipMode ? mMasterClip : nullptr, options,
+  auto row = std::make_shared<FilterItem>(mediaType, component, trackItem, mTarget.sequence,
+                                          masterClipMode ? mTarget.masterClip : nullptr, options,
                                           mOwnStation, this);
   row->SetIsMask(maskRow);
   row->SetGroupLevel(subgroupLevel);
@@ -646,7 +646,7 @@ ParameterControlInfo EffectControlsListView::MakeParameterInfo(const TrackItemRe
   ParameterControlInfo info;
   info.parentView = const_cast<EffectControlsListView*>(this);
   info.station = mOwnStation;
-  info.sequence = mSequence;
+  info.sequence = mTarget.sequence;
   info.component = component;
   info.param = param;
   // Master-clip effects keep their keyframes in the clip's own time.

@@ -402,5 +402,5 @@ void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.extra.emplace_back("rulerZoomIn", static_cast<std::int64_t>(mRuler->GetZoomInTime()));
   dump.extra.emplace_back("rulerZoomOut", static_cast<std::int64_t>(mRuler->GetZoomOutTime()));
   dump.extra.emplace_back("audioTimeUnits", mAudioTimeUnits);
-  dump.extra.emplace_back("masterClipTargeted", mMasterClip != nullptr);
+  dump.extra.emplace_back("masterClipTargeted", GetMasterClip() != nullptr);
 }

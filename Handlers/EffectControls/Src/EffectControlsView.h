@@ -174,7 +174,8 @@ class EffectControlsView : public TabView,
   // Targets a master clip's own content (match frame from the header, or a source clip);
   // navigation commands then act on the master clip. Null is ignored.
   void TargetMasterClip(const MasterClipRef& masterClip);
-  const MasterClipRef& GetMasterClip() const { return mMasterClip; }
+  // The list's: the one record of master-clip mode. Null outside it.
+  const MasterClipRef& GetMasterClip() const;
   // Carries out a master-clip navigation code on the targeted master clip (its in and out
   // points and markers are media times, mapped through the targeted clip). False when no
   // master clip is targeted or nothing changed.
@@ -324,7 +325,6 @@ class EffectControlsView : public TabView,
   StationName mSequenceStation;
   StationName mTargetStation;
   TickTime mSequenceEnd = 0;
-  MasterClipRef mMasterClip;
   TrackItemRef mTargetItem;  // the targeted clip or transition
   bool mAudioPartPlaying = false;
   TickTime mPositionBeforeAudioPart = 0;

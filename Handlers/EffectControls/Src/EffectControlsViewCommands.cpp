@@ -65,7 +65,7 @@ bool EffectControlsView::IsNavigationCommand(CommandID command) const {
 }
 
 bool EffectControlsView::OnNavigationCommand(CommandID command) {
-  if (mMasterClip) {
+  if (GetMasterClip()) {
     switch (command) {
       case kMarkInCommand:
         return NavigateMasterClip(kNavMarkIn);
@@ -243,7 +243,7 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
       break;
   }
   if (IsNavigationCommand(command)) {
-    const bool target = mSequence != nullptr || mMasterClip != nullptr;
+    const bool target = mSequence != nullptr || GetMasterClip() != nullptr;
     status.enabled = target && (editable || !IsEditingCommand(command));
     return true;
   }

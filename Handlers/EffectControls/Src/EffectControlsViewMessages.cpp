@@ -152,7 +152,7 @@ void EffectControlsView::ListenToMessage(const Message& message) {
     }
   } else if (const auto* properties = message.As<PropertiesChangedMessage>()) {
     const bool ofSequence = mSequence && properties->objectID == mSequence->GetID();
-    const bool ofMasterClip = mMasterClip && properties->objectID == mMasterClip->GetID();
+    const bool ofMasterClip = GetMasterClip() && properties->objectID == GetMasterClip()->GetID();
     for (const std::string& key : properties->keys) {
       if ((ofSequence || ofMasterClip) &&
           (key == kPropertyKey_InPoint || key == kPropertyKey_OutPoint)) {

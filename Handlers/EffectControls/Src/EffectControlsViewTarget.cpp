@@ -224,20 +224,21 @@ void EffectControlsView::TargetTransition(const TrackItemRef& item) {
   mHeader->SetTransition(mSequence, item, NeighbourClip(item, true), NeighbourClip(item, false));
 }
 
+const MasterClipRef& EffectControlsView::GetMasterClip() const {
+  return mListView->GetMasterClip();
+}
+
 void EffectControlsView::SetMasterClip(const MasterClipRef& masterClip) {
-  if (masterClip == mMasterClip) {
+  if (masterClip == GetMasterClip()) {
     return;
   }
-  if (mMasterClip) {
-    RemoveListener(mMasterClip->GetStation(), *this);
+  if (GetMasterClip()) {
+    RemoveListener(GetMasterClip()->GetStation(), *this);
   }
-  mMasterClip = masterClip;
-  if (mMasterClip) {
+  mListView->SetMasterClip(masterClip);
+  if (masterClip) {
     // Its in and out points and name arrive on its own station.
-    AddListener(mMasterClip->GetStation(), *this);
-    mListView->SetMasterClip(mMasterClip);
-  } else {
-    mListView->ClearMasterClip();
+    AddListener(masterClip->GetStation(), *this);
   }
 }
 

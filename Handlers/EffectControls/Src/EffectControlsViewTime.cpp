@@ -253,8 +253,9 @@ void EffectControlsView::ReloadTimeDisplays() {
 }
 
 TrackItemRef EffectControlsView::GetMasterClipItem() const {
-  return mMasterClip && mTargetItem && mTargetItem->GetMasterClip() == mMasterClip ? mTargetItem
-                                                                                   : nullptr;
+  return GetMasterClip() && mTargetItem && mTargetItem->GetMasterClip() == GetMasterClip()
+             ? mTargetItem
+             : nullptr;
 }
 
 void EffectControlsView::ReloadInOutMarks() {
@@ -262,10 +263,10 @@ void EffectControlsView::ReloadInOutMarks() {
   std::optional<TickTime> out;
   if (const TrackItemRef item = GetMasterClipItem()) {
     // The master clip's points are media times; the ruler shows them where the clip plays them.
-    if (const auto clipIn = mMasterClip->GetInPoint()) {
+    if (const auto clipIn = GetMasterClip()->GetInPoint()) {
       in = item->ClipTimeToSequenceTime(*clipIn);
     }
-    if (const auto clipOut = mMasterClip->GetOutPoint()) {
+    if (const auto clipOut = GetMasterClip()->GetOutPoint()) {
       out = item->ClipTimeToSequenceTime(*clipOut);
     }
   } else if (mSequence) {
@@ -316,11 +317,11 @@ void EffectControlsView::OnMarkTime(const Message& message) {
       return time ? std::optional<TickTime>(item->SequenceTimeToClipTime(*time)) : time;
     };
     if (setIn && setOut) {
-      SequencePropertyActions::SetInOutPoints(mMasterClip, toClip(in), toClip(out));
+      SequencePropertyActions::SetInOutPoints(GetMasterClip(), toClip(in), toClip(out));
     } else if (setIn) {
-      SequencePropertyActions::SetInPoint(mMasterClip, toClip(in));
+      SequencePropertyActions::SetInPoint(GetMasterClip(), toClip(in));
     } else if (setOut) {
-      SequencePropertyActions::SetOutPoint(mMasterClip, toClip(out));
+      SequencePropertyActions::SetOutPoint(GetMasterClip(), toClip(out));
     }
   } else if (mSequence) {
     if (setIn && setOut) {
@@ -347,35 +348,36 @@ bool EffectControlsView::NavigateMasterClip(int code) {
   };
   switch (code) {
     case kNavMarkIn:
-      return SequencePropertyActions::SetInPoint(mMasterClip, clipTime) == EditStatus::Done;
+      return SequencePropertyActions::SetInPoint(GetMasterClip(), clipTime) == EditStatus::Done;
     case kNavMarkOut:
-      return SequencePropertyActions::SetOutPoint(mMasterClip, clipTime) == EditStatus::Done;
+      return SequencePropertyActions::SetOutPoint(GetMasterClip(), clipTime) == EditStatus::Done;
     case kNavGoToIn:
-      return goTo(mMasterClip->GetInPoint().value_or(0));
+      return goTo(GetMasterClip()->GetInPoint().value_or(0));
     case kNavGoToOut:
-      if (const auto out = mMasterClip->GetOutPoint()) {
+      if (const auto out = GetMasterClip()->GetOutPoint()) {
         return goTo(*out);
       }
       return false;
     case kNavClearIn:
-      return SequencePropertyActions::SetInPoint(mMasterClip, std::nullopt) == EditStatus::Done;
+      return SequencePropertyActions::SetInPoint(GetMasterClip(), std::nullopt) == EditStatus::Done;
     case kNavClearOut:
-      return SequencePropertyActions::SetOutPoint(mMasterClip, std::nullopt) == EditStatus::Done;
+      return SequencePropertyActions::SetOutPoint(GetMasterClip(), std::nullopt) ==
+             EditStatus::Done;
     case kNavClearInOut:
-      return SequencePropertyActions::SetInOutPoints(mMasterClip, std::nullopt, std::nullopt) ==
+      return SequencePropertyActions::SetInOutPoints(GetMasterClip(), std::nullopt, std::nullopt) ==
              EditStatus::Done;
     case kNavNextMarker:
-      if (const auto next = mMasterClip->GetMarkers().NextMarkerTime(clipTime)) {
+      if (const auto next = GetMasterClip()->GetMarkers().NextMarkerTime(clipTime)) {
         return goTo(*next);
       }
       return false;
     case kNavPreviousMarker:
-      if (const auto previous = mMasterClip->GetMarkers().PreviousMarkerTime(clipTime)) {
+      if (const auto previous = GetMasterClip()->GetMarkers().PreviousMarkerTime(clipTime)) {
         return goTo(*previous);
       }
       return false;
     case kNavClearAllMarkers:
-      return MarkerActions::ClearAllMarkers(mMasterClip) == EditStatus::Done;
+      return MarkerActions::ClearAllMarkers(GetMasterClip()) == EditStatus::Done;
     default:
       return false;
   }
