@@ -40,18 +40,18 @@ enum class ScrollCode : std::int32_t;
 // uses none; they are for other panels that embed or extend the list.
 enum EffectControlsListViewStyle : std::uint32_t {
   kStyleNone = 0,
-  kStyleNoVideoExpander = 0x1,      // no video expander button
-  kStyleNoAudio = 0x2,              // audio clips show no rows
-  kStyleHideTimeRemapping = 0x8,    // no row for the time-remapping intrinsic
-  kStyleFilterOption6 = 0x40,       // passed to the effect rows
-  kStyleCheckboxSwitch = 0x80,      // effect rows switch with a check box
-  kStyleIndentFilters = 0x100,      // effect rows indented by 40 pixels
-  kStyleStartCollapsed = 0x200,     // effect rows start collapsed
-  kStyleNoMaskControls = 0x400,     // no mask-shape row and no mask rows
-  kStyleOwnSliderRows = 0x800,      // angle, point and colour parameters use the panel's rows
-  kStyleFlag2000 = 0x2000,          // parameter names start at 10 px, end at 3/4 of the width
-  kStyleNoXOTextExpander = 0x4000,  // no editable-text expander button
-  kStyleNoFilterIndent = 0x8000,    // effect rows have no indent of their own
+  kStyleNoVideoExpander = 0x1,        // no video expander button
+  kStyleNoAudio = 0x2,                // audio clips show no rows
+  kStyleHideTimeRemapping = 0x8,      // no row for the time-remapping intrinsic
+  kStyleNoVideoSetupButton = 0x40,    // video effect rows show no setup-dialog button
+  kStyleCheckboxSwitch = 0x80,        // effect rows switch with a check box
+  kStyleIndentFilters = 0x100,        // effect rows indented by 40 pixels
+  kStyleStartCollapsed = 0x200,       // effect rows start collapsed
+  kStyleNoMaskControls = 0x400,       // no mask-shape row and no mask rows
+  kStyleOwnSliderRows = 0x800,        // angle, point and colour parameters use the panel's rows
+  kStyleWideParameterNames = 0x2000,  // parameter names start at 10 px, end at 3/4 of the width
+  kStyleNoXOTextExpander = 0x4000,    // no editable-text expander button
+  kStyleNoFilterIndent = 0x8000,      // effect rows have no indent of their own
 };
 
 // The left half of the effect controls panel: a scrolling list of sections (editable text,
@@ -163,10 +163,21 @@ class EffectControlsListView : public SubView, public Listener {
   TrackItemRef LoadAudioFilters(const std::vector<TrackItemRef>& audioItems);
   void LoadVideoTransition(const TrackItemRef& trackItem);
   void LoadAudioTransition(const TrackItemRef& trackItem);
+  // How LoadFilter makes an effect's row.
+  struct FilterRowOptions {
+    // The effect is the master clip's own: its keyframes are in clip time and it takes no masks.
+    bool masterClipMode = false;
+    // A mask-shape row may be added when the effect takes masks.
+    bool allowMasks = true;
+    // Nesting depth: 0 for a section's top row, one more for each mask level.
+    int subgroupLevel = 0;
+    // The effect is a mask of the row above it.
+    bool isMask = false;
+  };
   // The row of one effect with its mask rows and parameter rows (not yet finished or shown).
   std::shared_ptr<FilterItem> LoadFilter(MediaType mediaType, const TrackItemRef& trackItem,
-                                         const ComponentRef& component, bool masterClipMode,
-                                         bool allowMasks, int subgroupLevel, bool isMask);
+                                         const ComponentRef& component,
+                                         const FilterRowOptions& rowOptions);
   // The row (or rows) of one parameter, appended to `parentRow`. `controlIndex` is the
   // parameter's position in its component.
   void LoadFilterParameterControls(const TrackItemRef& trackItem,

@@ -266,7 +266,8 @@ void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
     if (component->IsCapsule() && !isTemplate) {
       continue;
     }
-    auto row = LoadFilter(MediaType::Video, trackItem, component, masterClipMode, true, 0, false);
+    auto row =
+        LoadFilter(MediaType::Video, trackItem, component, {.masterClipMode = masterClipMode});
     if (component->GetMatchName() == kMatchNameGraphicGroup) {
       mGraphicsItems.AddItem(row);
     } else {
@@ -289,8 +290,8 @@ void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
       }
       for (const ComponentRef& component : layers->GetComponents()) {
         if (!component->IsIntrinsic()) {
-          mGraphicsItems.AddItem(
-              LoadFilter(MediaType::Video, trackItem, component, masterClipMode, true, 0, false));
+          mGraphicsItems.AddItem(LoadFilter(MediaType::Video, trackItem, component,
+                                            {.masterClipMode = masterClipMode}));
         }
       }
     }
@@ -306,7 +307,7 @@ void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
       const ComponentRef component = mVideoChain->GetAt(position);
       if (!component->IsIntrinsic()) {
         mVideoItems.AddItem(
-            LoadFilter(MediaType::Video, trackItem, component, masterClipMode, true, 0, false));
+            LoadFilter(MediaType::Video, trackItem, component, {.masterClipMode = masterClipMode}));
       }
     }
   }
@@ -388,8 +389,7 @@ TrackItemRef EffectControlsListView::LoadAudioFilters(const std::vector<TrackIte
     const TrackItemRef& item = part->GetTrackItem();
     if (const ComponentChainRef& chain = item->GetComponentChain()) {
       for (const ComponentRef& component : chain->GetComponents()) {
-        part->GetItems().AddItem(
-            LoadFilter(MediaType::Audio, item, component, false, true, 0, false));
+        part->GetItems().AddItem(LoadFilter(MediaType::Audio, item, component, {}));
       }
     }
     FinishAndShowRows(part->GetItems());
@@ -483,8 +483,8 @@ void EffectControlsListView::RebuildTransitionComponentView(
   // The first component of the chain is the transition itself, which its row presents; the
   // next one carries the settings the transition exposes as an effect.
   if (mTarget.transitionChain && mTarget.transitionChain->GetCount() > 1) {
-    auto row = LoadFilter(MediaType::Video, item, mTarget.transitionChain->GetAt(1), false, false,
-                          0, false);
+    auto row = LoadFilter(MediaType::Video, item, mTarget.transitionChain->GetAt(1),
+                          {.allowMasks = false});
     mVideoItems.AddItem(row);
     row->FinishCreateSelf();
     row->Show();
@@ -525,32 +525,31 @@ void EffectControlsListView::LoadAudioTransition(const TrackItemRef& trackItem) 
 std::shared_ptr<FilterItem> EffectControlsListView::LoadFilter(MediaType mediaType,
                                                                const TrackItemRef& trackItem,
                                                                const ComponentRef& component,
-                                                               bool masterClipMode, bool allowMasks,
-                                                               int subgroupLevel, bool isMask) {
+                                                               const FilterRowOptions& rowOptions) {
   if (!component) {
     throw NullInterfaceException("IComponent");
   }
-  const bool maskRow = isMask && component->GetMatchName() == kMatchName_Mask;
+  const bool maskRow = rowOptions.isMask && component->GetMatchName() == kMatchName_Mask;
 
   FilterItemOptions options;
-  options.topLevel = subgroupLevel == 0;
+  options.topLevel = rowOptions.subgroupLevel == 0;
   options.checkboxSwitch = HasECPStyle(kStyleCheckboxSwitch);
-  options.option6 = HasECPStyle(kStyleFilterOption6);
+  options.noVideoSetupButton = HasECPStyle(kStyleNoVideoSetupButton);
   options.indent = HasECPStyle(kStyleIndentFilters) ? 40 : 0;
   options.startCollapsed = HasECPStyle(kStyleStartCollapsed);
   options.noIndent = HasECPStyle(kStyleNoFilterIndent);
 
   auto row = std::make_shared<FilterItem>(mediaType, component, trackItem, mTarget.sequence,
-                                          masterClipMode ? mTarget.masterClip : nullptr, options,
-                                          mOwnStation, this);
+                                          rowOptions.masterClipMode ? mTarget.masterClip : nullptr,
+                                          options, mOwnStation, this);
   row->SetIsMask(maskRow);
-  row->SetGroupLevel(subgroupLevel);
+  row->SetGroupLevel(rowOptions.subgroupLevel);
   if (component->IsOffline()) {
     return row;
   }
   // Layers of a master graphic's chain nest no deeper here: the row's own subgroup level says
   // how deep a layer sits.
-  const int baseLevel = subgroupLevel;
+  const int baseLevel = rowOptions.subgroupLevel;
 
   if (mediaType == MediaType::Audio && HasCustomAudioUI(*component)) {
     for (const bool second : {false, true}) {
@@ -569,7 +568,7 @@ std::shared_ptr<FilterItem> EffectControlsListView::LoadFilter(MediaType mediaTy
     const std::string& matchName = component->GetMatchName();
     const bool takesMaskShape = component->CanTakeMasks() &&
                                 (!component->IsIntrinsic() || matchName == kMatchName_Opacity) &&
-                                allowMasks && !masterClipMode &&
+                                rowOptions.allowMasks && !rowOptions.masterClipMode &&
                                 matchName != kMatchNameWarpStabilizer &&
                                 matchName != kMatchNameAutoReframe;
     if (takesMaskShape) {
@@ -580,7 +579,8 @@ std::shared_ptr<FilterItem> EffectControlsListView::LoadFilter(MediaType mediaTy
     }
     for (const ComponentRef& mask : component->GetMasks()) {
       row->AddItem(
-          LoadFilter(MediaType::Video, trackItem, mask, false, false, baseLevel + 1, true));
+          LoadFilter(MediaType::Video, trackItem, mask,
+                     {.allowMasks = false, .subgroupLevel = baseLevel + 1, .isMask = true}));
     }
   }
 
@@ -601,7 +601,7 @@ std::shared_ptr<FilterItem> EffectControlsListView::LoadFilter(MediaType mediaTy
     }
     if (param->GetType() == ParamType::GroupBegin) {
       ParameterRowRequest request;
-      request.info = MakeParameterInfo(trackItem, component, param, masterClipMode);
+      request.info = MakeParameterInfo(trackItem, component, param, rowOptions.masterClipMode);
       request.listStyle = mStyle;
       request.componentIsMask = component->IsMask();
       std::shared_ptr<GroupBeginParameter> group = ParameterRowFactory::CreateGroupRow(request);

@@ -231,7 +231,7 @@ void EffectControlsListView::DrawItem(DC& dc, EffectItem& row, const Rect& rect,
   int right = row.IsParameter() && !row.IsGroupBegin()
                   ? width / 2 - 20 + row.GetParameterIndentInPixels()
                   : width / 2 + 100;
-  if (HasECPStyle(kStyleFlag2000)) {
+  if (HasECPStyle(kStyleWideParameterNames)) {
     left = 10;
     right = width * 3 / 4 + row.GetParameterIndentInPixels() - 30;
   }

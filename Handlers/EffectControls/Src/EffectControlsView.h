@@ -105,7 +105,8 @@ class EffectControlsView : public TabView,
   static constexpr int kEditMarkerCommand = 11793;
   static constexpr int kFirstColoredMarkerCommand = 11830;
   static constexpr int kLastColoredMarkerCommand = 11837;
-  static constexpr int kSequenceCommand11008 = 11008;
+  // A host edit of the sequence, taken only in sequence mode with editable effects.
+  static constexpr int kSequenceEditCommand = 11008;
   static constexpr int kKeyframeAreaCommand = 12100;
   static constexpr int kBlendModeNormalCommand = 12200;
   static constexpr int kBlendModeOtherCommand = 12201;
@@ -179,7 +180,7 @@ class EffectControlsView : public TabView,
   // Carries out a master-clip navigation code on the targeted master clip (its in and out
   // points and markers are media times, mapped through the targeted clip). False when no
   // master clip is targeted or nothing changed.
-  bool NavigateMasterClip(int code);
+  bool NavigateMasterClip(MasterClipNavigation code);
 
   // --- Layout state ---
   void OnSeparatorMoved(int listWidth);

@@ -41,56 +41,59 @@ std::optional<EffectControlsKeyframeView::SnapFlag> SnapFlagFor(CommandID comman
   }
 }
 
+// A host navigation or marker command as the panel takes it.
+struct NavigationCommand {
+  CommandID command;
+  // Changes the sequence (or master clip): refused while the effects are read only.
+  bool edits;
+  // What it does to a targeted master clip instead; none: it acts on the sequence in either
+  // mode (markers added or edited from here are sequence markers).
+  std::optional<EffectControlsView::MasterClipNavigation> onMasterClip;
+};
+
+using View = EffectControlsView;
+constexpr NavigationCommand kNavigationCommands[] = {
+    {View::kMarkInCommand, true, View::kNavMarkIn},
+    {View::kMarkOutCommand, true, View::kNavMarkOut},
+    {View::kGoToInCommand, false, View::kNavGoToIn},
+    {View::kGoToOutCommand, false, View::kNavGoToOut},
+    {View::kClearInCommand, true, View::kNavClearIn},
+    {View::kClearOutCommand, true, View::kNavClearOut},
+    {View::kClearInOutCommand, true, View::kNavClearInOut},
+    {View::kAddMarkerCommand, true, std::nullopt},
+    {View::kClearMarkerCommand, true, std::nullopt},
+    {View::kClearAllMarkersCommand, true, View::kNavClearAllMarkers},
+    {View::kNextMarkerCommand, false, View::kNavNextMarker},
+    {View::kPreviousMarkerCommand, false, View::kNavPreviousMarker},
+    {View::kEditMarkerCommand, true, std::nullopt},
+};
+// Each command of the range adds a marker of one colour.
+constexpr NavigationCommand kColoredMarkerCommand{View::kFirstColoredMarkerCommand, true,
+                                                  std::nullopt};
+
+// Null when `command` is no navigation command.
+const NavigationCommand* FindNavigationCommand(CommandID command) {
+  for (const NavigationCommand& entry : kNavigationCommands) {
+    if (entry.command == command) {
+      return &entry;
+    }
+  }
+  if (command >= View::kFirstColoredMarkerCommand && command <= View::kLastColoredMarkerCommand) {
+    return &kColoredMarkerCommand;
+  }
+  return nullptr;
+}
+
 }  // namespace
 
 bool EffectControlsView::IsNavigationCommand(CommandID command) const {
-  switch (command) {
-    case kMarkInCommand:
-    case kMarkOutCommand:
-    case kGoToInCommand:
-    case kGoToOutCommand:
-    case kClearInCommand:
-    case kClearOutCommand:
-    case kClearInOutCommand:
-    case kAddMarkerCommand:
-    case kClearMarkerCommand:
-    case kClearAllMarkersCommand:
-    case kNextMarkerCommand:
-    case kPreviousMarkerCommand:
-    case kEditMarkerCommand:
-      return true;
-    default:
-      return command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand;
-  }
+  return FindNavigationCommand(command) != nullptr;
 }
 
 bool EffectControlsView::OnNavigationCommand(CommandID command) {
-  if (GetMasterClip()) {
-    switch (command) {
-      case kMarkInCommand:
-        return NavigateMasterClip(kNavMarkIn);
-      case kMarkOutCommand:
-        return NavigateMasterClip(kNavMarkOut);
-      case kGoToInCommand:
-        return NavigateMasterClip(kNavGoToIn);
-      case kGoToOutCommand:
-        return NavigateMasterClip(kNavGoToOut);
-      case kClearInCommand:
-        return NavigateMasterClip(kNavClearIn);
-      case kClearOutCommand:
-        return NavigateMasterClip(kNavClearOut);
-      case kClearInOutCommand:
-        return NavigateMasterClip(kNavClearInOut);
-      case kNextMarkerCommand:
-        return NavigateMasterClip(kNavNextMarker);
-      case kPreviousMarkerCommand:
-        return NavigateMasterClip(kNavPreviousMarker);
-      case kClearAllMarkersCommand:
-        return NavigateMasterClip(kNavClearAllMarkers);
-      default:
-        // Markers added or edited from here are sequence markers in either mode.
-        break;
-    }
+  const NavigationCommand* navigation = FindNavigationCommand(command);
+  if (GetMasterClip() && navigation != nullptr && navigation->onMasterClip) {
+    return NavigateMasterClip(*navigation->onMasterClip);
   }
   if (!mSequence) {
     return false;
@@ -173,23 +176,16 @@ bool EffectControlsView::IsEditingCommand(CommandID command) const {
     case kDeleteAllEffectsCommand:
     case kCommandPaste:
     case kCommandClear:
-    case kMarkInCommand:
-    case kMarkOutCommand:
-    case kClearInCommand:
-    case kClearOutCommand:
-    case kClearInOutCommand:
-    case kAddMarkerCommand:
-    case kClearMarkerCommand:
-    case kClearAllMarkersCommand:
-    case kEditMarkerCommand:
-    case kSequenceCommand11008:
+    case kSequenceEditCommand:
     case kBlendModeNormalCommand:
     case kBlendModeOtherCommand:
     case kCapsuleResetAllCommand:
       return true;
     default:
-      return (command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand) ||
-             (command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand);
+      if (const NavigationCommand* navigation = FindNavigationCommand(command)) {
+        return navigation->edits;
+      }
+      return command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand;
   }
 }
 
@@ -272,7 +268,7 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
         status = CommandStatus{};
       }
       return true;
-    case kSequenceCommand11008:
+    case kSequenceEditCommand:
     case kBlendModeNormalCommand:
     case kBlendModeOtherCommand:
     case kCapsuleResetAllCommand:

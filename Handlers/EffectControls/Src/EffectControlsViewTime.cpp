@@ -336,7 +336,7 @@ void EffectControlsView::OnMarkTime(const Message& message) {
   ReloadInOutMarks();
 }
 
-bool EffectControlsView::NavigateMasterClip(int code) {
+bool EffectControlsView::NavigateMasterClip(MasterClipNavigation code) {
   const TrackItemRef item = GetMasterClipItem();
   if (!item) {
     return false;

@@ -350,7 +350,7 @@ TEST_F(ListLayoutTest, TheWideNameStyleMovesASelectedParametersNameBand) {
   EXPECT_TRUE(isSelected(400 / 2 - 20 + indent - 1));
   EXPECT_FALSE(isSelected(400 / 2 - 20 + indent + 1));
 
-  list->SetStyle(kStyleFlag2000);
+  list->SetStyle(kStyleWideParameterNames);
   host->InvalidateAll();
   host->Render();
   // From 10 px to three quarters of the width, less 30.
