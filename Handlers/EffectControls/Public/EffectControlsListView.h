@@ -3,9 +3,11 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
+#include "Handlers/EffectControls/Public/PanelTarget.h"
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/FilterMultiSelection.h"
@@ -30,6 +32,8 @@ class FilterItem;
 class KeyframeMultiSelection;
 class MultiPictureButton;
 struct EffectRowRules;
+class PanelTimeline;
+struct PanelTimelineChangedMessage;
 struct ParameterControlInfo;
 struct PlannedRow;
 enum class ScrollCode : std::int32_t;
@@ -38,26 +42,26 @@ enum class ScrollCode : std::int32_t;
 // uses none; they are for other panels that embed or extend the list.
 enum EffectControlsListViewStyle : std::uint32_t {
   kStyleNone = 0,
-  kStyleNoVideoExpander = 0x1,      // no video expander button
-  kStyleNoAudio = 0x2,              // audio clips show no rows
-  kStyleHideTimeRemapping = 0x8,    // no row for the time-remapping intrinsic
-  kStyleFilterOption6 = 0x40,       // passed to the effect rows
-  kStyleCheckboxSwitch = 0x80,      // effect rows switch with a check box
-  kStyleIndentFilters = 0x100,      // effect rows indented by 40 pixels
-  kStyleStartCollapsed = 0x200,     // effect rows start collapsed
-  kStyleNoMaskControls = 0x400,     // no mask-shape row and no mask rows
-  kStyleOwnSliderRows = 0x800,      // angle, point and colour parameters use the panel's rows
-  kStyleFlag2000 = 0x2000,          // parameter names start at 10 px, end at 3/4 of the width
-  kStyleNoXOTextExpander = 0x4000,  // no editable-text expander button
-  kStyleNoFilterIndent = 0x8000,    // effect rows have no indent of their own
+  kStyleNoVideoExpander = 0x1,        // no video expander button
+  kStyleNoAudio = 0x2,                // audio clips show no rows
+  kStyleHideTimeRemapping = 0x8,      // no row for the time-remapping intrinsic
+  kStyleNoVideoSetupButton = 0x40,    // video effect rows show no setup-dialog button
+  kStyleCheckboxSwitch = 0x80,        // effect rows switch with a check box
+  kStyleIndentFilters = 0x100,        // effect rows indented by 40 pixels
+  kStyleStartCollapsed = 0x200,       // effect rows start collapsed
+  kStyleNoMaskControls = 0x400,       // no mask-shape row and no mask rows
+  kStyleOwnSliderRows = 0x800,        // angle, point and colour parameters use the panel's rows
+  kStyleWideParameterNames = 0x2000,  // parameter names start at 10 px, end at 3/4 of the width
+  kStyleNoXOTextExpander = 0x4000,    // no editable-text expander button
+  kStyleNoFilterIndent = 0x8000,      // effect rows have no indent of their own
 };
 
 // The left half of the effect controls panel: a scrolling list of sections (editable text,
 // graphics, video, one per audio part), each a list of effect rows with their parameter rows
 // below. The list builds its rows from the target (the selected clip's linked video and audio
 // items, a transition, or a master clip's own effects), places and paints them, keeps the
-// effect and parameter selections and the keyframe selection the keyframe area edits, and the
-// time state the keyframe area draws with.
+// effect and parameter selections and the keyframe selection the keyframe area edits. Its rows
+// and the keyframe area read the edit time and zoom from the panel's PanelTimeline.
 //
 // Ownership: always held by a std::shared_ptr (the panel view owns it); the list owns its rows
 // (section lists and audio parts) and its buttons (child views). Rows are rebuilt, never
@@ -72,11 +76,10 @@ enum EffectControlsListViewStyle : std::uint32_t {
 // (GetKeyframeViewStation). UI thread only.
 class EffectControlsListView : public SubView, public Listener {
  public:
-  enum TargetKind : int {
-    kTargetClip = 1,
-    kTargetTransition = 2,
-    kTargetTransitionComponent = 3,  // a transition with its own effects
-  };
+  using TargetKind = PanelTarget::Kind;
+  static constexpr TargetKind kTargetClip = PanelTarget::kClip;
+  static constexpr TargetKind kTargetTransition = PanelTarget::kTransition;
+  static constexpr TargetKind kTargetTransitionComponent = PanelTarget::kTransitionComponent;
 
   static constexpr int kInitialBaseline = 0;
   static constexpr int kSectionHeaderHeight = 21;
@@ -99,8 +102,10 @@ class EffectControlsListView : public SubView, public Listener {
 
   // `parent`: where the list's commands go that it does not handle (the panel view; not owned).
   // `ownStation`: where the list's messages go out (and the rows report); the list listens
-  // there too. Registers the keyframe station.
-  EffectControlsListView(Commander* parent, StationName ownStation);
+  // there too. Registers the keyframe station. `timeline`: the panel's time state, shared with
+  // the panel view that owns it; null gives the list one of its own (a list on its own).
+  EffectControlsListView(Commander* parent, StationName ownStation,
+                         std::shared_ptr<PanelTimeline> timeline = nullptr);
   ~EffectControlsListView() override;
 
   // --- Style ---
@@ -113,26 +118,30 @@ class EffectControlsListView : public SubView, public Listener {
   // --- Target ---
   // The sequence whose selection the list shows (null: none; the list is then empty).
   void SetSequence(const SequenceRef& sequence);
-  const SequenceRef& GetSequence() const { return mSequence; }
+  const SequenceRef& GetSequence() const { return mTarget.sequence; }
   // Decides from the sequence's clip selection what to show (video, audio, a transition, a
-  // transition with its own effects) and rebuilds when that changed.
+  // transition with its own effects) and rebuilds unless the rows were built for that very
+  // target (see PanelTarget).
   void DoSequenceClipSelectionChanged(const SequenceRef& sequence);
   // Master-clip mode: the list shows the master clip's own video effects (the selected clip's
   // master clip). Takes effect at the next build.
-  void SetMasterClip(const MasterClipRef& masterClip) { mMasterClip = masterClip; }
-  bool IsViewingMasterClip() const { return mMasterClip != nullptr; }
-  const MasterClipRef& GetMasterClip() const { return mMasterClip; }
-  void ClearMasterClip() { mMasterClip.reset(); }
-  void SetTargetKind(TargetKind kind) { mTargetKind = kind; }
-  TargetKind GetTargetKind() const { return mTargetKind; }
-  void SetShowVideo(bool show) { mShowVideo = show; }
-  void SetShowAudio(bool show) { mShowAudio = show; }
-  bool GetShowVideo() const { return mShowVideo; }
-  bool GetShowAudio() const { return mShowAudio; }
+  void SetMasterClip(const MasterClipRef& masterClip) { mTarget.masterClip = masterClip; }
+  bool IsViewingMasterClip() const { return mTarget.masterClip != nullptr; }
+  const MasterClipRef& GetMasterClip() const { return mTarget.masterClip; }
+  void ClearMasterClip() { mTarget.masterClip.reset(); }
+  void SetTargetKind(TargetKind kind) { mTarget.kind = kind; }
+  TargetKind GetTargetKind() const { return mTarget.kind; }
+  void SetShowVideo(bool show) { mTarget.showVideo = show; }
+  void SetShowAudio(bool show) { mTarget.showAudio = show; }
+  bool GetShowVideo() const { return mTarget.showVideo; }
+  bool GetShowAudio() const { return mTarget.showAudio; }
   // The chain of a targeted transition that carries effects of its own
   // (kTargetTransitionComponent).
-  void SetTransitionChain(const ComponentChainRef& chain) { mTransitionChain = chain; }
-  const ComponentChainRef& GetTransitionChain() const { return mTransitionChain; }
+  void SetTransitionChain(const ComponentChainRef& chain) { mTarget.transitionChain = chain; }
+  const ComponentChainRef& GetTransitionChain() const { return mTarget.transitionChain; }
+  // What the next build shows, and what the rows were built for (none since the last clear).
+  const PanelTarget& GetTarget() const { return mTarget; }
+  const std::optional<PanelTarget>& GetBuiltTarget() const { return mBuiltTarget; }
   // The effects of the master clip's chain are read only, or the sequence is.
   bool IsReadOnlyEffectContainer() const;
 
@@ -220,8 +229,9 @@ class EffectControlsListView : public SubView, public Listener {
   void ClearSelection();
 
   // --- Edit time ---
-  // The edit line in sequence time; every parameter row reads it.
-  TickTime GetEditTime() const { return *mEditTime; }
+  // The edit line in sequence time (the timeline's); every parameter row reads it.
+  TickTime GetEditTime() const;
+  const PanelTimeline& GetTimeline() const { return *mTimeline; }
 
   // --- Layout and scrolling ---
   // Places every row and section button for the current scroll offset.
@@ -261,15 +271,15 @@ class EffectControlsListView : public SubView, public Listener {
   void OnDisclosureStateChanged();
   void OnDisclosureStateAllChanged(bool expanded);
 
-  // --- Shared time state (written by the panel view, read by the keyframe area) ---
+  // --- Keyframe area zoom (the timeline's; see PanelTimeline) ---
   // Each returns false and changes nothing when the value is the stored one. A time per pixel
   // that is not a positive number is refused (false).
   bool SetTimePerPixel(double secondsPerPixel);
   bool SetVisibleKeyframeTime(TickTime time);
-  double GetTimePerPixel() const { return mTimePerPixel; }
-  TickTime GetVisibleKeyframeTime() const { return mVisibleKeyframeTime; }
+  double GetTimePerPixel() const;
+  TickTime GetVisibleKeyframeTime() const;
   // One frame of this rate lasts one pixel of the keyframe area.
-  const FrameRate& GetPixelFrameRate() const { return mPixelFrameRate; }
+  const FrameRate& GetPixelFrameRate() const;
 
   // --- State dump ---
   // Every row in display order (sections top to bottom, each row before its children) with
@@ -313,8 +323,13 @@ class EffectControlsListView : public SubView, public Listener {
 
  private:
   void ListenTo(const StationName& station);
+  void OnTimelineChanged(const PanelTimelineChangedMessage& change);
+  // Rows whose values were read at another time read them again.
+  void SyncRowsToTime(bool force);
   void StopListeningTo(const StationName& station);
   void NewKeyframeSelection();
+  // What `groups` (the sequence's clip selection) asks the list to show.
+  PanelTarget ChooseTarget(std::vector<TrackItemGroup> groups) const;
   void FinishAndShowRows(const EffectItemList& list);
   // The one layout walk behind PositionItems and GetMaxHeight: section headers and top rows
   // from the top of the content down; `sink` (null: only measure) receives the placements.
@@ -344,31 +359,30 @@ class EffectControlsListView : public SubView, public Listener {
                                          const ComponentRef& component,
                                          const ComponentParamRef& param, bool masterClipMode) const;
 
-  TargetKind mTargetKind = kTargetTransition;
+  // What the selection chose (and the next build shows).
+  PanelTarget mTarget;
+  // What the rows were built for; empty after ClearList.
+  std::optional<PanelTarget> mBuiltTarget;
   bool mVideoExpanded = false;
   bool mTextExpanded = false;
   bool mGraphicsExpanded = false;
-  bool mShowVideo = false;
-  bool mShowAudio = false;
   EffectItemList mVideoItems;
   EffectItemList mGraphicsItems;
   std::vector<std::shared_ptr<AudioPartInfo>> mAudioParts;
   FilterMultiSelection::Selection mSelectedFilters;
   ParameterMultiSelection::Selection mSelectedParameters;
-  SequenceRef mSequence;
-  MasterClipRef mMasterClip;
   ComponentChainRef mVideoChain;
   ComponentChainRef mMasterGraphicChain;
   StationName mChainStation;
   StationName mMasterGraphicChainStation;
-  ComponentChainRef mTransitionChain;
   TrackItemRef mVideoTrackItem;
   StationName mVideoTrackItemStation;
   TrackItemRef mAudioTransitionItem;
   StationName mOwnStation;
   StationName mKeyframeStation;
   std::shared_ptr<KeyframeMultiSelection> mKeyframeSelection;
-  std::shared_ptr<TickTime> mEditTime;
+  // Shared with the panel view, which owns it, and (its edit time) with the rows.
+  std::shared_ptr<PanelTimeline> mTimeline;
   TickTime mTrackItemStart = 0;
   TickTime mTrackItemMediaIn = 0;
   int mScrollOffset = 0;
@@ -385,16 +399,6 @@ class EffectControlsListView : public SubView, public Listener {
   EffectControlsListScroller* mScroller = nullptr;  // not owned; see SetEffectControlsView
   int mVideoHeaderTop = -1;
   int mGraphicsHeaderTop = -1;
-
-  TickTime mVisibleKeyframeTime = 0;
-  double mTimePerPixel = 0.0;
-  FrameRate mPixelFrameRate;
-
-  // The selection the list was last built for, and whether a build ran since the last clear.
-  std::vector<TrackItemGroup> mTargetSelection;
-  bool mBuilt = false;
-  // The master clip the rows were built for (null: the sequence clip's own effects).
-  MasterClipRef mBuiltMasterClip;
 
   bool mPendingAutoSelect = false;
   int mPendingAutoSelectIndex = -1;

@@ -7,6 +7,7 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/AudioPartInfo.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Preferences.h"
 #include "Host/Messaging/PropertyList.h"
 #include "Host/Messaging/Station.h"
@@ -111,32 +112,38 @@ void EffectControlsKeyframeView::SetSnapFlags(unsigned flags) {
 
 EffectControlsKeyframeView::~EffectControlsKeyframeView() = default;
 
+void EffectControlsKeyframeView::SetTimeline(std::shared_ptr<const PanelTimeline> timeline) {
+  if (mTimeline) {
+    RemoveListener(mTimeline->GetStation(), *this);
+  }
+  mTimeline = std::move(timeline);
+  if (mTimeline) {
+    AddListener(mTimeline->GetStation(), *this);
+  }
+  Invalidate();
+}
+
+void EffectControlsKeyframeView::ListenToMessage(const Message& message) {
+  if (message.Is<PanelTimelineChangedMessage>()) {
+    Invalidate();
+  }
+}
+
 void EffectControlsKeyframeView::SetPinToClip(bool pinned) {
   mPinned = pinned;
   Invalidate();
 }
 
-void EffectControlsKeyframeView::SetClipSpan(TickTime start, TickTime end) {
-  mClipStart = start;
-  mClipEnd = std::max(start, end);
-  Invalidate();
-}
-
-void EffectControlsKeyframeView::SetEditTime(TickTime time) {
-  if (time != mEditTime) {
-    mEditTime = time;
-    Invalidate();
-  }
+TickTime EffectControlsKeyframeView::GetEditTime() const {
+  return mTimeline ? mTimeline->GetEditTime() : 0;
 }
 
 TickTime EffectControlsKeyframeView::GetVisibleStartTime() const {
-  const auto list = mList.lock();
-  return list ? list->GetVisibleKeyframeTime() : 0;
+  return mTimeline ? mTimeline->GetVisibleStart() : 0;
 }
 
 double EffectControlsKeyframeView::GetSecondsPerPixel() const {
-  const auto list = mList.lock();
-  return list ? list->GetTimePerPixel() : 0.0;
+  return mTimeline ? mTimeline->GetSecondsPerPixel() : 0.0;
 }
 
 double EffectControlsKeyframeView::TimeToX(TickTime time) const {
@@ -175,12 +182,14 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
   dc.FillRect(bounds, noClip);
 
   const auto list = mList.lock();
-  if (!list || !(list->GetTimePerPixel() > 0.0)) {
+  if (!list || !mTimeline || !(GetSecondsPerPixel() > 0.0)) {
     return;
   }
   // The clip's span is the area's working background; outside it the no-clip colour shows.
-  const int clipLeft = std::max(0, static_cast<int>(std::floor(TimeToX(mClipStart))));
-  const int clipRight = std::min(bounds.Width(), static_cast<int>(std::ceil(TimeToX(mClipEnd))));
+  const int clipLeft =
+      std::max(0, static_cast<int>(std::floor(TimeToX(mTimeline->GetShownStart()))));
+  const int clipRight =
+      std::min(bounds.Width(), static_cast<int>(std::ceil(TimeToX(mTimeline->GetShownEnd()))));
   if (clipRight > clipLeft) {
     dc.FillRect(Rect{clipLeft, 0, clipRight, bounds.Height()}, background);
   }
@@ -240,7 +249,7 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
   }
 
   // The current time across every track.
-  const int x = static_cast<int>(std::lround(TimeToX(mEditTime)));
+  const int x = static_cast<int>(std::lround(TimeToX(mTimeline->GetEditTime())));
   if (x >= 0 && x < bounds.Width()) {
     dc.FillRect(Rect{x, 0, x + 1, bounds.Height()},
                 ColorManager::GetColor(kColor_CurrentTimeIndicator));

@@ -3,6 +3,7 @@
 #include <memory>
 #include <string_view>
 
+#include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Message.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/TickTime.h"
@@ -10,6 +11,7 @@
 
 class EffectControlsListView;
 class ImageList;
+class PanelTimeline;
 
 // The keyframe area asks the panel view to slide its visible time (a drag reached an edge).
 // `amount` in ticks, positive towards later times. Sent on the list's keyframe station.
@@ -21,17 +23,21 @@ struct EffectControlsAutoScrollMessage : MessageOf<EffectControlsAutoScrollMessa
 
 // The keyframe area beside the list: the targeted clip's span as a band, one track per visible
 // list row at the row's position, the keyframes of time-varying parameters and the current
-// time line. It owns no rows: it reads their positions and the shared time state (visible start
-// time, seconds per pixel) from the list it was given.
+// time line. It owns no rows: it reads their positions from the list it was given, and the
+// time (edit line, visible start, seconds per pixel, the clip's span) from the panel's
+// timeline, redrawing when that changes.
 //
 // Owned by the panel view (a child view). UI thread only.
-class EffectControlsKeyframeView : public SubView {
+class EffectControlsKeyframeView : public SubView, public Listener {
  public:
   explicit EffectControlsKeyframeView(Commander* superCommander = nullptr);
   ~EffectControlsKeyframeView() override;
 
-  // The list whose rows and time state the area follows (shared with the panel view).
+  // The list whose rows the area follows (shared with the panel view).
   void SetListView(std::weak_ptr<EffectControlsListView> list) { mList = std::move(list); }
+  // The panel's time state (shared with the panel view, which writes it). Null: the area has
+  // no time and draws no clip, keyframes or edit line.
+  void SetTimeline(std::shared_ptr<const PanelTimeline> timeline);
   // The keyframe glyphs (6 x kind + variant); null draws plain diamonds.
   void SetKeyframeImages(std::shared_ptr<const ImageList> images) { mImages = std::move(images); }
 
@@ -41,10 +47,8 @@ class EffectControlsKeyframeView : public SubView {
   bool IsPinnedToClip() const { return mPinned; }
   void SetKeyframesVisible(bool visible) { mKeyframesVisible = visible; }
 
-  // The clip's span and the edit line, in sequence ticks.
-  void SetClipSpan(TickTime start, TickTime end);
-  void SetEditTime(TickTime time);
-  TickTime GetEditTime() const { return mEditTime; }
+  // The edit line, in sequence ticks.
+  TickTime GetEditTime() const;
 
   // Snapping flags: kSnapKeyframes switches snapping as a whole, the others pick what keyframe
   // drags snap to. Read from the application properties at construction and written back on
@@ -65,7 +69,7 @@ class EffectControlsKeyframeView : public SubView {
   bool IsSnapFlagSet(SnapFlag flag) const { return (mSnapFlags & flag) != 0; }
   void ToggleSnapFlag(SnapFlag flag) { SetSnapFlags(mSnapFlags ^ flag); }
 
-  // Time mapping from the list's time state: x in local pixels.
+  // Time mapping from the timeline: x in local pixels.
   TickTime GetVisibleStartTime() const;
   double GetSecondsPerPixel() const;
   double TimeToX(TickTime time) const;
@@ -86,17 +90,18 @@ class EffectControlsKeyframeView : public SubView {
   void LeftButtonUpSelf(Point point, KeyModifiers modifiers) override;
   bool SetCursorSelf(Point point, KeyModifiers modifiers) override;
 
+  // --- Listener ---
+  void ListenToMessage(const Message& message) override;
+
  private:
   void ReportSeparator(Point point) const;
 
   std::weak_ptr<EffectControlsListView> mList;
+  std::shared_ptr<const PanelTimeline> mTimeline;
   std::shared_ptr<const ImageList> mImages;
   int mToolMode = 100;
   bool mPinned = true;
   bool mKeyframesVisible = true;
-  TickTime mClipStart = 0;
-  TickTime mClipEnd = 0;
-  TickTime mEditTime = 0;
   bool mDraggingSeparator = false;
   unsigned mSnapFlags = kSnapKeyframes | kSnapTargets;
 };

@@ -3,13 +3,12 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 
 #include <algorithm>
-#include <cmath>
-#include <limits>
 #include <utility>
 
 #include "Handlers/EffectControls/Src/AudioPartInfo.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ComponentChainActions.h"
@@ -74,20 +73,21 @@ void AppendDumpRows(const std::shared_ptr<EffectItem>& row, std::vector<std::str
 
 }  // namespace
 
-EffectControlsListView::EffectControlsListView(Commander* parent, StationName ownStation)
+EffectControlsListView::EffectControlsListView(Commander* parent, StationName ownStation,
+                                               std::shared_ptr<PanelTimeline> timeline)
     : SubView(parent),
       mOwnStation(std::move(ownStation)),
-      mEditTime(std::make_shared<TickTime>(0)),
+      mTimeline(timeline ? std::move(timeline) : std::make_shared<PanelTimeline>()),
       mNormalFont(kFont_Normal),
       mLabelFont(kFont_Normal) {
   mKeyframeStation = RegisterUniqueStation(mOwnStation + ".Keyframes");
   RegisterStation(mOwnStation);
   for (const StationName& station :
        {mOwnStation, StationName(kSequenceActivationStation),
-        StationName(kVideoFilterNotifierStation), StationName(kTextControlResizeStation)}) {
+        StationName(kVideoFilterNotifierStation), StationName(kTextControlResizeStation),
+        mTimeline->GetStation()}) {
     AddListener(station, *this);
   }
-  SetTimePerPixel(1.0 / 25.0);
 }
 
 EffectControlsListView::~EffectControlsListView() {
@@ -123,86 +123,78 @@ void EffectControlsListView::DestroySelf() {
 // --- Target ---
 
 void EffectControlsListView::SetSequence(const SequenceRef& sequence) {
-  if (mSequence == sequence) {
+  if (mTarget.sequence == sequence) {
     return;
   }
-  if (mSequence) {
-    StopListeningTo(mSequence->GetStation());
+  if (mTarget.sequence) {
+    StopListeningTo(mTarget.sequence->GetStation());
   }
-  mSequence = sequence;
-  if (mSequence) {
-    ListenTo(mSequence->GetStation());
-    *mEditTime = mSequence->GetCurrentTime();
+  mTarget.sequence = sequence;
+  if (mTarget.sequence) {
+    ListenTo(mTarget.sequence->GetStation());
+    mTimeline->SetEditTime(mTarget.sequence->GetCurrentTime());
   }
 }
 
 void EffectControlsListView::DoSequenceClipSelectionChanged(const SequenceRef& sequence) {
   SetSequence(sequence);
-  const TargetKind oldKind = mTargetKind;
-  const bool oldShowVideo = mShowVideo;
-  const bool oldShowAudio = mShowAudio;
-  const ComponentChainRef oldTransitionChain = mTransitionChain;
-
-  mShowVideo = false;
-  mShowAudio = false;
-  mTransitionChain.reset();
-  mTargetKind = kTargetClip;
-
-  std::vector<TrackItemGroup> groups;
-  if (mSequence) {
-    groups = mSequence->GetSelection();
-  }
-  if (groups.size() == 1) {
-    const TrackItemGroup& group = groups.front();
-    if (group.videoItems.size() == 1) {
-      const TrackItemRef& item = group.videoItems.front();
-      if (item->IsClip()) {
-        mShowVideo = true;
-        mShowAudio = !group.audioItems.empty();
-      } else if (item->IsTransition() && AllowsViewMode(kTransitionViewMode)) {
-        mTargetKind = kTargetTransition;
-        mShowVideo = true;
-        if (item->HasOwnComponentChain()) {
-          mTransitionChain = item->GetComponentChain();
-          mTargetKind = kTargetTransitionComponent;
-        }
-      }
-    } else if (group.videoItems.empty() && !group.audioItems.empty()) {
-      const TrackItemRef& item = group.audioItems.front();
-      if (item->IsClip()) {
-        mShowAudio = true;
-      } else if (group.audioItems.size() == 1 && item->IsTransition() &&
-                 AllowsViewMode(kTransitionViewMode)) {
-        mTargetKind = kTargetTransition;
-        mShowAudio = true;
-      }
-    }
-  } else if (IsValidLinkedTrackItems(groups)) {
-    mShowVideo = true;
-    mShowAudio = true;
-  }
-
-  const bool sameTarget = mTargetKind == oldKind && mShowVideo == oldShowVideo &&
-                          mShowAudio == oldShowAudio && mTransitionChain == oldTransitionChain &&
-                          groups == mTargetSelection && mBuilt && mMasterClip == mBuiltMasterClip;
-  mTargetSelection = std::move(groups);
-  if (sameTarget) {
-    UpdateParamsUI(*mEditTime, true);
+  mTarget = ChooseTarget(mTarget.sequence ? mTarget.sequence->GetSelection()
+                                          : std::vector<TrackItemGroup>());
+  if (mBuiltTarget == mTarget) {
+    UpdateParamsUI(GetEditTime(), true);
     Invalidate();
     return;
   }
   ClearAndRebuildList();
 }
 
+PanelTarget EffectControlsListView::ChooseTarget(std::vector<TrackItemGroup> groups) const {
+  PanelTarget target;
+  target.sequence = mTarget.sequence;
+  target.masterClip = mTarget.masterClip;
+  target.kind = kTargetClip;
+  if (groups.size() == 1) {
+    const TrackItemGroup& group = groups.front();
+    if (group.videoItems.size() == 1) {
+      const TrackItemRef& item = group.videoItems.front();
+      if (item->IsClip()) {
+        target.showVideo = true;
+        target.showAudio = !group.audioItems.empty();
+      } else if (item->IsTransition() && AllowsViewMode(kTransitionViewMode)) {
+        target.kind = kTargetTransition;
+        target.showVideo = true;
+        if (item->HasOwnComponentChain()) {
+          target.transitionChain = item->GetComponentChain();
+          target.kind = kTargetTransitionComponent;
+        }
+      }
+    } else if (group.videoItems.empty() && !group.audioItems.empty()) {
+      const TrackItemRef& item = group.audioItems.front();
+      if (item->IsClip()) {
+        target.showAudio = true;
+      } else if (group.audioItems.size() == 1 && item->IsTransition() &&
+                 AllowsViewMode(kTransitionViewMode)) {
+        target.kind = kTargetTransition;
+        target.showAudio = true;
+      }
+    }
+  } else if (IsValidLinkedTrackItems(groups)) {
+    target.showVideo = true;
+    target.showAudio = true;
+  }
+  target.selection = std::move(groups);
+  return target;
+}
+
 bool EffectControlsListView::IsReadOnlyEffectContainer() const {
-  if (mMasterClip) {
-    if (EditPermissions::IsReadOnly(*mMasterClip)) {
+  if (mTarget.masterClip) {
+    if (EditPermissions::IsReadOnly(*mTarget.masterClip)) {
       return true;
     }
-    return mMasterClip->GetProperties().GetBool(kPropertyKey_FromInactiveProject, false);
+    return mTarget.masterClip->GetProperties().GetBool(kPropertyKey_FromInactiveProject, false);
   }
-  if (mSequence) {
-    return EditPermissions::IsReadOnly(*mSequence);
+  if (mTarget.sequence) {
+    return EditPermissions::IsReadOnly(*mTarget.sequence);
   }
   return false;
 }
@@ -291,7 +283,9 @@ void EffectControlsListView::AutoSelectNthEmbeddedEffect() {
 // --- Messages and commands ---
 
 void EffectControlsListView::ListenToMessage(const Message& message) {
-  if (message.Is<EffectControlsDisclosureStateChanged>()) {
+  if (const auto* time = message.As<PanelTimelineChangedMessage>()) {
+    OnTimelineChanged(*time);
+  } else if (message.Is<EffectControlsDisclosureStateChanged>()) {
     OnDisclosureStateChanged();
   } else if (const auto* all = message.As<DisclosureStateAllChanged>()) {
     OnDisclosureStateAllChanged(all->expanded);
@@ -422,39 +416,39 @@ void EffectControlsListView::StopListeningTo(const StationName& station) {
   }
 }
 
-// --- Shared time state ---
+// --- Time ---
+
+TickTime EffectControlsListView::GetEditTime() const {
+  return mTimeline->GetEditTime();
+}
 
 bool EffectControlsListView::SetTimePerPixel(double secondsPerPixel) {
-  // Zero, negative or NaN would make every pixel last no time at all (or less): refused.
-  if (!(secondsPerPixel > 0.0)) {
-    return false;
-  }
-  if (secondsPerPixel == mTimePerPixel) {
-    return false;
-  }
-  mTimePerPixel = secondsPerPixel;
-  const double pixelsPerSecond = 1.0 / secondsPerPixel;
-  TickTime ticks = std::numeric_limits<TickTime>::max();
-  if (pixelsPerSecond != 0.0) {
-    const double exact = std::trunc(static_cast<double>(kTicksPerSecond) / pixelsPerSecond);
-    // Finer than one tick a pixel cannot be counted in whole ticks; huge spans saturate.
-    ticks = exact < 1.0 ? 1
-            : exact >= static_cast<double>(std::numeric_limits<TickTime>::max())
-                ? std::numeric_limits<TickTime>::max()
-                : static_cast<TickTime>(exact);
-  }
-  mPixelFrameRate = FrameRate::FromTicksPerFrame(ticks).value_or(FrameRate());
-  Invalidate();
-  return true;
+  return mTimeline->SetSecondsPerPixel(secondsPerPixel);
 }
 
 bool EffectControlsListView::SetVisibleKeyframeTime(TickTime time) {
-  if (time == mVisibleKeyframeTime) {
-    return false;
+  return mTimeline->SetVisibleStart(time);
+}
+
+double EffectControlsListView::GetTimePerPixel() const {
+  return mTimeline->GetSecondsPerPixel();
+}
+
+TickTime EffectControlsListView::GetVisibleKeyframeTime() const {
+  return mTimeline->GetVisibleStart();
+}
+
+const FrameRate& EffectControlsListView::GetPixelFrameRate() const {
+  return mTimeline->GetPixelFrameRate();
+}
+
+void EffectControlsListView::OnTimelineChanged(const PanelTimelineChangedMessage& change) {
+  if (change.Has(PanelTimeline::kEditTimeChanged)) {
+    SyncRowsToTime(false);
   }
-  mVisibleKeyframeTime = time;
-  Invalidate();
-  return true;
+  if (change.Has(PanelTimeline::kZoomChanged) || change.Has(PanelTimeline::kVisibleStartChanged)) {
+    Invalidate();
+  }
 }
 
 // --- State dump ---

@@ -8,6 +8,7 @@
 #include "Handlers/EffectControls/Src/EffectRowPlan.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Handlers/EffectControls/Src/FilterItemOptions.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/Station.h"
@@ -44,8 +45,8 @@ const TrackItemRef* FirstItem(const std::vector<TrackItemRef>& items) {
 
 void EffectControlsListView::ClearAndRebuildList() {
   ClearList();
-  if (mTargetKind == kTargetClip || mTargetKind == kTargetTransition ||
-      mTargetKind == kTargetTransitionComponent) {
+  if (mTarget.kind == kTargetClip || mTarget.kind == kTargetTransition ||
+      mTarget.kind == kTargetTransitionComponent) {
     try {
       RebuildClipOrTransitionView();
     } catch (...) {
@@ -60,8 +61,7 @@ void EffectControlsListView::ClearAndRebuildList() {
       throw;
     }
   }
-  mBuilt = true;
-  mBuiltMasterClip = mMasterClip;
+  mBuiltTarget = mTarget;
   UpdateVScrollBar();
   BroadcastListChanged();
   Invalidate();
@@ -107,30 +107,31 @@ void EffectControlsListView::ClearList() {
   }
   mVideoHeaderTop = -1;
   mGraphicsHeaderTop = -1;
-  mBuilt = false;
+  mBuiltTarget.reset();
 }
 
 void EffectControlsListView::RebuildClipOrTransitionView() {
-  if (!mSequence) {
+  if (!mTarget.sequence) {
     return;
   }
   mVideoLimiterPresent = false;
-  const std::vector<TrackItemGroup>& selection = mSequence->GetSelection();
+  const std::vector<TrackItemGroup>& selection = mTarget.sequence->GetSelection();
   if (!selection.empty()) {
     // Linked video and audio items selected as two groups are one clip.
     TrackItemGroup group = selection.front();
-    if (selection.size() == 2 && mShowVideo && mShowAudio && group.audioItems.empty()) {
+    if (selection.size() == 2 && mTarget.showVideo && mTarget.showAudio &&
+        group.audioItems.empty()) {
       group.audioItems = selection[1].audioItems;
     }
-    if (mTargetKind == kTargetTransition) {
+    if (mTarget.kind == kTargetTransition) {
       RebuildTransitionView(&group);
-    } else if (mTransitionChain) {
+    } else if (mTarget.transitionChain) {
       RebuildTransitionComponentView(&group);
     } else {
-      if (mShowVideo) {
+      if (mTarget.showVideo) {
         RebuildVideoClipView(&group);
       }
-      if (mShowAudio) {
+      if (mTarget.showAudio) {
         RebuildAudioClipView(&group);
       }
     }
@@ -149,7 +150,7 @@ void EffectControlsListView::ResetTimes() {
 }
 
 void EffectControlsListView::NewKeyframeSelection() {
-  mKeyframeSelection = std::make_shared<KeyframeMultiSelection>(mSequence);
+  mKeyframeSelection = std::make_shared<KeyframeMultiSelection>(mTarget.sequence);
 }
 
 void EffectControlsListView::FinishAndShowRows(const EffectItemList& list) {
@@ -160,7 +161,11 @@ void EffectControlsListView::FinishAndShowRows(const EffectItemList& list) {
 }
 
 void EffectControlsListView::UpdateParamsUI(TickTime editTime, bool force) {
-  *mEditTime = editTime;
+  mTimeline->SetEditTime(editTime);
+  SyncRowsToTime(force);
+}
+
+void EffectControlsListView::SyncRowsToTime(bool force) {
   ForEachTopRow(
       [force](const std::shared_ptr<EffectItem>& row) { row->RecursiveSynchToTime(force); });
 }
@@ -179,8 +184,8 @@ void EffectControlsListView::RebuildVideoClipView(const TrackItemGroup* inTrackI
   const TrackItemRef item = *first;
   mVideoTrackItemStation = item->GetStation();
   ListenTo(mVideoTrackItemStation);
-  if (mMasterClip) {
-    LoadVideoFilters(item, mMasterClip->GetVideoChain(), true);
+  if (mTarget.masterClip) {
+    LoadVideoFilters(item, mTarget.masterClip->GetVideoChain(), true);
   } else {
     LoadVideoFilters(item, item->GetComponentChain(), false);
   }
@@ -189,7 +194,7 @@ void EffectControlsListView::RebuildVideoClipView(const TrackItemGroup* inTrackI
 
 void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
                                               const ComponentChainRef& chain, bool masterClipMode) {
-  mTargetKind = kTargetClip;
+  mTarget.kind = kTargetClip;
   mVideoExpanded = true;
   if (mVideoExpander) {
     mVideoExpander->SetValue(0);
@@ -238,7 +243,7 @@ void EffectControlsListView::LoadVideoFilters(const TrackItemRef& trackItem,
   if (mGraphicsExpander && !mGraphicsItems.IsEmpty()) {
     mGraphicsExpander->Show();
   }
-  UpdateParamsUI(*mEditTime, true);
+  UpdateParamsUI(GetEditTime(), true);
 }
 
 // --- Audio clip ---
@@ -253,14 +258,14 @@ void EffectControlsListView::RebuildAudioClipView(const TrackItemGroup* inTrackI
   }
   const std::vector<TrackItemRef>& items = inTrackItemGroup->audioItems;
   const TrackItemRef* first = FirstItem(items);
-  if (first == nullptr || !(*first)->IsClip() || mMasterClip) {
+  if (first == nullptr || !(*first)->IsClip() || mTarget.masterClip) {
     return;
   }
   LoadAudioFilters(items);
 }
 
 TrackItemRef EffectControlsListView::LoadAudioFilters(const std::vector<TrackItemRef>& audioItems) {
-  mTargetKind = kTargetClip;
+  mTarget.kind = kTargetClip;
   EffectRowSource source;
   source.mode = IsViewingMasterClip() ? EffectRowMode::MasterClip : EffectRowMode::Clip;
   source.audioItems = audioItems;
@@ -348,14 +353,14 @@ void EffectControlsListView::RebuildTransitionView(const TrackItemGroup* inTrack
   if (inTrackItemGroup == nullptr) {
     return;
   }
-  if (mShowVideo) {
+  if (mTarget.showVideo) {
     const TrackItemRef* first = FirstItem(inTrackItemGroup->videoItems);
     if (first != nullptr && (*first)->IsTransition()) {
       const TrackItemRef item = *first;
       LoadVideoTransition(item);
       mVideoTrackItem = item;
     }
-  } else if (mShowAudio) {
+  } else if (mTarget.showAudio) {
     const TrackItemRef* first = FirstItem(inTrackItemGroup->audioItems);
     if (first != nullptr && (*first)->IsTransition()) {
       const TrackItemRef item = *first;
@@ -385,7 +390,7 @@ void EffectControlsListView::RebuildTransitionComponentView(
   NewKeyframeSelection();
   EffectRowSource source;
   source.mode = EffectRowMode::TransitionEffects;
-  source.videoChain = mTransitionChain;
+  source.videoChain = mTarget.transitionChain;
   const EffectRowPlan plan = PlanEffectRows(source, MakeRowRules());
   const std::size_t transitionRows = mVideoItems.Size();
   AddEffectRows(mVideoItems, plan.video, item);
@@ -394,7 +399,7 @@ void EffectControlsListView::RebuildTransitionComponentView(
     mVideoItems[index]->Show();
   }
   mVideoLimiterPresent = mVideoLimiterPresent || plan.videoLimiterPresent;
-  UpdateParamsUI(*mEditTime, true);
+  UpdateParamsUI(GetEditTime(), true);
 }
 
 void EffectControlsListView::LoadVideoTransition(const TrackItemRef& trackItem) {
@@ -449,14 +454,14 @@ std::shared_ptr<FilterItem> EffectControlsListView::MakeEffectRow(const PlannedR
   FilterItemOptions options;
   options.topLevel = effect.groupLevel == 0;
   options.checkboxSwitch = HasECPStyle(kStyleCheckboxSwitch);
-  options.option6 = HasECPStyle(kStyleFilterOption6);
+  options.noVideoSetupButton = HasECPStyle(kStyleNoVideoSetupButton);
   options.indent = HasECPStyle(kStyleIndentFilters) ? 40 : 0;
   options.startCollapsed = HasECPStyle(kStyleStartCollapsed);
   options.noIndent = HasECPStyle(kStyleNoFilterIndent);
 
-  auto row = std::make_shared<FilterItem>(effect.mediaType, effect.component, trackItem, mSequence,
-                                          effect.masterClipEffect ? mMasterClip : nullptr, options,
-                                          mOwnStation, this);
+  auto row = std::make_shared<FilterItem>(
+      effect.mediaType, effect.component, trackItem, mTarget.sequence,
+      effect.masterClipEffect ? mTarget.masterClip : nullptr, options, mOwnStation, this);
   row->SetIsMask(effect.isMask);
   row->SetGroupLevel(effect.groupLevel);
   AddPlannedRows(row, effect.children, trackItem, effect.masterClipEffect);
@@ -519,12 +524,12 @@ ParameterControlInfo EffectControlsListView::MakeParameterInfo(const TrackItemRe
   ParameterControlInfo info;
   info.parentView = const_cast<EffectControlsListView*>(this);
   info.station = mOwnStation;
-  info.sequence = mSequence;
+  info.sequence = mTarget.sequence;
   info.component = component;
   info.param = param;
   // Master-clip effects keep their keyframes in the clip's own time.
   info.trackItem = masterClipMode ? nullptr : trackItem;
-  info.editTime = mEditTime;
+  info.editTime = PanelTimeline::ShareEditTime(mTimeline);
   info.readOnly = IsReadOnlyEffectContainer();
   return info;
 }

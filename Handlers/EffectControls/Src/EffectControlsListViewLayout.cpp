@@ -25,7 +25,7 @@ class EffectControlsListView::LayoutSink {
 int EffectControlsListView::WalkLayout(LayoutSink* sink) const {
   int y = kInitialBaseline - mScrollOffset;
   // Headers belong to clip targets; a transition shows its row alone.
-  const bool headers = mTargetKind == kTargetClip || mTargetKind == kTargetTransitionComponent;
+  const bool headers = mTarget.kind == kTargetClip || mTarget.kind == kTargetTransitionComponent;
 
   // A section: its header when it has one, then its rows. Rows of a closed section sit at the
   // header's bottom and take no height (they are hidden).
@@ -51,7 +51,7 @@ int EffectControlsListView::WalkLayout(LayoutSink* sink) const {
   section(LayoutSink::Section::kGraphics, mGraphicsItems, headers && !mGraphicsItems.IsEmpty(),
           mGraphicsExpanded, mGraphicsExpander.get(), nullptr);
   section(LayoutSink::Section::kVideo, mVideoItems,
-          headers && !mVideoItems.IsEmpty() && !mTransitionChain, mVideoExpanded,
+          headers && !mVideoItems.IsEmpty() && !mTarget.transitionChain, mVideoExpanded,
           mVideoExpander.get(), nullptr);
   for (const auto& part : mAudioParts) {
     section(LayoutSink::Section::kAudioPart, part->GetItems(), headers && part->IsClipPart(),

@@ -64,16 +64,17 @@ void FillExcept(DC& dc, const Rect& area, const std::vector<Rect>& holes, std::s
 void EffectControlsListView::PaintSelf(DC& dc) {
   PaintBackground(dc);
   const bool empty = mVideoItems.IsEmpty() && mGraphicsItems.IsEmpty() && mAudioParts.empty();
-  if (!empty && (mTargetKind == kTargetClip || mTargetKind == kTargetTransitionComponent)) {
+  if (!empty && (mTarget.kind == kTargetClip || mTarget.kind == kTargetTransitionComponent)) {
     if (!mGraphicsItems.IsEmpty()) {
       DrawItemList(dc, mGraphicsItems, mGraphicsHeaderTop,
                    LocalizeString(mMasterGraphicChain ? kLabelMasterGraphics : kLabelGraphics),
                    mGraphicsExpanded, 0);
     }
-    const std::string videoLabel = mTransitionChain ? std::string() : LocalizeString(kLabelVideo);
+    const std::string videoLabel =
+        mTarget.transitionChain ? std::string() : LocalizeString(kLabelVideo);
     if (!mVideoItems.IsEmpty()) {
       DrawItemList(dc, mVideoItems, mVideoHeaderTop, videoLabel,
-                   mVideoExpanded || mTransitionChain != nullptr, 0);
+                   mVideoExpanded || mTarget.transitionChain != nullptr, 0);
     }
     const std::string audioLabel = LocalizeString(kLabelAudio);
     const int width = GetBounds().Width();
@@ -230,7 +231,7 @@ void EffectControlsListView::DrawItem(DC& dc, EffectItem& row, const Rect& rect,
   int right = row.IsParameter() && !row.IsGroupBegin()
                   ? width / 2 - 20 + row.GetParameterIndentInPixels()
                   : width / 2 + 100;
-  if (HasECPStyle(kStyleFlag2000)) {
+  if (HasECPStyle(kStyleWideParameterNames)) {
     left = 10;
     right = width * 3 / 4 + row.GetParameterIndentInPixels() - 30;
   }

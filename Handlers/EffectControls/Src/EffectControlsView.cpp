@@ -7,6 +7,7 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Localization.h"
 #include "Host/Messaging/Preferences.h"
 #include "Host/Messaging/PropertyList.h"
@@ -36,12 +37,14 @@ constexpr TickTime kDefaultRulerEnd = 25401600000000;  // 100 s
 EffectControlsView::EffectControlsView(Commander* parent, std::string contextName)
     : TabView(parent),
       mContextName(std::move(contextName)),
-      mStation(RegisterUniqueStation("EffectControlsView")) {
+      mStation(RegisterUniqueStation("EffectControlsView")),
+      mTimeline(std::make_shared<PanelTimeline>()) {
   mHeader = std::make_shared<EffectControlsListHeader>(this);
-  mListView = std::make_shared<EffectControlsListView>(this, mStation);
+  mListView = std::make_shared<EffectControlsListView>(this, mStation, mTimeline);
   mListView->SetEffectControlsView(this);
   mKeyframeView = std::make_shared<EffectControlsKeyframeView>(this);
   mKeyframeView->SetListView(mListView);
+  mKeyframeView->SetTimeline(mTimeline);
   mKeyframeView->SetPinToClip(mPinned);
   mRulerHolder = std::make_shared<SubView>(this);
   mRuler = std::make_shared<TimeBarControl>(
@@ -335,8 +338,9 @@ bool EffectControlsView::MouseWheelSelf(const WheelEvent& event) {
 }
 
 bool EffectControlsView::MouseMagnifySelf(const MagnifyEvent& event) {
-  const double s = std::clamp(mTimePerPixel - event.amount * 0.5, 0.001, 1.0);
-  ZoomToTimePerPixel(s, true);
+  const double secondsPerPixel =
+      std::clamp(mTimeline->GetSecondsPerPixel() - event.amount * 0.5, 0.001, 1.0);
+  ZoomToTimePerPixel(secondsPerPixel, true);
   return true;
 }
 
@@ -384,8 +388,8 @@ void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.rows = mListView->GetDumpRows();
   if (mKeyframesVisible) {
     StateDumpKeyframeArea area;
-    area.visibleStartTime = mListView->GetVisibleKeyframeTime();
-    area.secondsPerPixel = mListView->GetTimePerPixel();
+    area.visibleStartTime = mTimeline->GetVisibleStart();
+    area.secondsPerPixel = mTimeline->GetSecondsPerPixel();
     dump.keyframeArea = area;
   }
   dump.extra.emplace_back("selectedKeyframeCount",
@@ -398,5 +402,5 @@ void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.extra.emplace_back("rulerZoomIn", static_cast<std::int64_t>(mRuler->GetZoomInTime()));
   dump.extra.emplace_back("rulerZoomOut", static_cast<std::int64_t>(mRuler->GetZoomOutTime()));
   dump.extra.emplace_back("audioTimeUnits", mAudioTimeUnits);
-  dump.extra.emplace_back("masterClipTargeted", mMasterClip != nullptr);
+  dump.extra.emplace_back("masterClipTargeted", GetMasterClip() != nullptr);
 }

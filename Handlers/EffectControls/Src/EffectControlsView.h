@@ -22,6 +22,7 @@ class EffectControlsListHeader;
 class EffectControlsListView;
 class HotTimecodeControl;
 class MultiPictureButton;
+class PanelTimeline;
 class PictureButton;
 class ScrollBar;
 class SubView;
@@ -104,7 +105,8 @@ class EffectControlsView : public TabView,
   static constexpr int kEditMarkerCommand = 11793;
   static constexpr int kFirstColoredMarkerCommand = 11830;
   static constexpr int kLastColoredMarkerCommand = 11837;
-  static constexpr int kSequenceCommand11008 = 11008;
+  // A host edit of the sequence, taken only in sequence mode with editable effects.
+  static constexpr int kSequenceEditCommand = 11008;
   static constexpr int kKeyframeAreaCommand = 12100;
   static constexpr int kBlendModeNormalCommand = 12200;
   static constexpr int kBlendModeOtherCommand = 12201;
@@ -173,11 +175,12 @@ class EffectControlsView : public TabView,
   // Targets a master clip's own content (match frame from the header, or a source clip);
   // navigation commands then act on the master clip. Null is ignored.
   void TargetMasterClip(const MasterClipRef& masterClip);
-  const MasterClipRef& GetMasterClip() const { return mMasterClip; }
+  // The list's: the one record of master-clip mode. Null outside it.
+  const MasterClipRef& GetMasterClip() const;
   // Carries out a master-clip navigation code on the targeted master clip (its in and out
   // points and markers are media times, mapped through the targeted clip). False when no
   // master clip is targeted or nothing changed.
-  bool NavigateMasterClip(int code);
+  bool NavigateMasterClip(MasterClipNavigation code);
 
   // --- Layout state ---
   void OnSeparatorMoved(int listWidth);
@@ -193,10 +196,12 @@ class EffectControlsView : public TabView,
   bool IsAudioLoop() const { return mAudioLoop; }
   const SequenceRef& GetSequence() const { return mSequence; }
   const std::vector<TrackItemGroup>& GetSelectedGroups() const { return mSelectedGroups; }
-  TickTime GetClipStart() const { return mClipStart; }
-  TickTime GetClipEnd() const { return mClipEnd; }
-  double GetTimePerPixel() const { return mTimePerPixel; }
-  TickTime GetVisibleBaseTime() const { return mVisibleBaseTime; }
+  // The panel's time state: edit line, zoom and the shown clip's span. The view writes it.
+  const PanelTimeline& GetTimeline() const { return *mTimeline; }
+  TickTime GetClipStart() const;
+  TickTime GetClipEnd() const;
+  double GetTimePerPixel() const;
+  TickTime GetVisibleBaseTime() const;
   int GetScrollPosition() const { return mScrollPosition; }
   int GetScrollRange() const { return mScrollRange; }
   double GetScrollScale() const { return mScrollScale; }
@@ -259,11 +264,19 @@ class EffectControlsView : public TabView,
   void TargetClip(const TrackItemRef& item);
   void TargetTransition(const TrackItemRef& item);
   void SetVisibleRange(TickTime start, TickTime end);
+  // Zooms to `secondsPerPixel` (already limited); `keepEditLine` places the range around the
+  // edit line as ZoomToTimePerPixel describes.
+  void ApplyZoom(double secondsPerPixel, bool keepEditLine);
+  // The shown clip's or transition's span: the keyframe area's band.
+  void SetShownRange(TickTime start, TickTime end);
   void UpdateAudioButtons();
   void SetAudioTimeUnits(bool audioUnits);
   void RenameSelectedEffect();
   void SavePreset();
+  // Moves the edit line: the timeline, the ruler, the time field and the sequence.
   void SetEditTime(TickTime time);
+  // Shows where the player is without moving the sequence's edit line.
+  void ShowEditTime(TickTime time);
   // Shows the ruler's new zoom [zoomIn, zoomOut] in the list and the keyframe area.
   void ApplyRulerZoom();
   void ReloadInOutMarks();
@@ -286,6 +299,8 @@ class EffectControlsView : public TabView,
 
   std::string mContextName;
   StationName mStation;
+  // Shared with the list and the keyframe area, which read it; the rows hold its edit time.
+  std::shared_ptr<PanelTimeline> mTimeline;
   std::shared_ptr<EffectControlsListHeader> mHeader;
   std::shared_ptr<EffectControlsListView> mListView;
   std::shared_ptr<EffectControlsKeyframeView> mKeyframeView;
@@ -304,8 +319,6 @@ class EffectControlsView : public TabView,
   bool mKeyframesVisible = true;
   bool mAudioLoop = false;
   std::vector<TrackItemGroup> mSelectedGroups;
-  TickTime mClipStart = 0;
-  TickTime mClipEnd = 0;
   float mSeparatorRatio = 0.0F;
   float mSeparatorRatioMaximized = 0.0F;
   int mKeyframeAreaWidth = kMinKeyframeWidth;
@@ -313,14 +326,10 @@ class EffectControlsView : public TabView,
   StationName mSequenceStation;
   StationName mTargetStation;
   TickTime mSequenceEnd = 0;
-  TickTime mEditLine = 0;
-  MasterClipRef mMasterClip;
   TrackItemRef mTargetItem;  // the targeted clip or transition
   bool mAudioPartPlaying = false;
   TickTime mPositionBeforeAudioPart = 0;
   bool mScrubbing = false;
-  double mTimePerPixel = -1.0;
-  TickTime mVisibleBaseTime = 0;
   int mScrollPosition = -1;
   int mScrollRange = -1;
   double mScrollScale = 0.0;

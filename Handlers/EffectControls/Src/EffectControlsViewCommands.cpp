@@ -4,6 +4,7 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Localization.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentActions.h"
@@ -40,66 +41,70 @@ std::optional<EffectControlsKeyframeView::SnapFlag> SnapFlagFor(CommandID comman
   }
 }
 
+// A host navigation or marker command as the panel takes it.
+struct NavigationCommand {
+  CommandID command;
+  // Changes the sequence (or master clip): refused while the effects are read only.
+  bool edits;
+  // What it does to a targeted master clip instead; none: it acts on the sequence in either
+  // mode (markers added or edited from here are sequence markers).
+  std::optional<EffectControlsView::MasterClipNavigation> onMasterClip;
+};
+
+using View = EffectControlsView;
+constexpr NavigationCommand kNavigationCommands[] = {
+    {View::kMarkInCommand, true, View::kNavMarkIn},
+    {View::kMarkOutCommand, true, View::kNavMarkOut},
+    {View::kGoToInCommand, false, View::kNavGoToIn},
+    {View::kGoToOutCommand, false, View::kNavGoToOut},
+    {View::kClearInCommand, true, View::kNavClearIn},
+    {View::kClearOutCommand, true, View::kNavClearOut},
+    {View::kClearInOutCommand, true, View::kNavClearInOut},
+    {View::kAddMarkerCommand, true, std::nullopt},
+    {View::kClearMarkerCommand, true, std::nullopt},
+    {View::kClearAllMarkersCommand, true, View::kNavClearAllMarkers},
+    {View::kNextMarkerCommand, false, View::kNavNextMarker},
+    {View::kPreviousMarkerCommand, false, View::kNavPreviousMarker},
+    {View::kEditMarkerCommand, true, std::nullopt},
+};
+// Each command of the range adds a marker of one colour.
+constexpr NavigationCommand kColoredMarkerCommand{View::kFirstColoredMarkerCommand, true,
+                                                  std::nullopt};
+
+// Null when `command` is no navigation command.
+const NavigationCommand* FindNavigationCommand(CommandID command) {
+  for (const NavigationCommand& entry : kNavigationCommands) {
+    if (entry.command == command) {
+      return &entry;
+    }
+  }
+  if (command >= View::kFirstColoredMarkerCommand && command <= View::kLastColoredMarkerCommand) {
+    return &kColoredMarkerCommand;
+  }
+  return nullptr;
+}
+
 }  // namespace
 
 bool EffectControlsView::IsNavigationCommand(CommandID command) const {
-  switch (command) {
-    case kMarkInCommand:
-    case kMarkOutCommand:
-    case kGoToInCommand:
-    case kGoToOutCommand:
-    case kClearInCommand:
-    case kClearOutCommand:
-    case kClearInOutCommand:
-    case kAddMarkerCommand:
-    case kClearMarkerCommand:
-    case kClearAllMarkersCommand:
-    case kNextMarkerCommand:
-    case kPreviousMarkerCommand:
-    case kEditMarkerCommand:
-      return true;
-    default:
-      return command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand;
-  }
+  return FindNavigationCommand(command) != nullptr;
 }
 
 bool EffectControlsView::OnNavigationCommand(CommandID command) {
-  if (mMasterClip) {
-    switch (command) {
-      case kMarkInCommand:
-        return NavigateMasterClip(kNavMarkIn);
-      case kMarkOutCommand:
-        return NavigateMasterClip(kNavMarkOut);
-      case kGoToInCommand:
-        return NavigateMasterClip(kNavGoToIn);
-      case kGoToOutCommand:
-        return NavigateMasterClip(kNavGoToOut);
-      case kClearInCommand:
-        return NavigateMasterClip(kNavClearIn);
-      case kClearOutCommand:
-        return NavigateMasterClip(kNavClearOut);
-      case kClearInOutCommand:
-        return NavigateMasterClip(kNavClearInOut);
-      case kNextMarkerCommand:
-        return NavigateMasterClip(kNavNextMarker);
-      case kPreviousMarkerCommand:
-        return NavigateMasterClip(kNavPreviousMarker);
-      case kClearAllMarkersCommand:
-        return NavigateMasterClip(kNavClearAllMarkers);
-      default:
-        // Markers added or edited from here are sequence markers in either mode.
-        break;
-    }
+  const NavigationCommand* navigation = FindNavigationCommand(command);
+  if (GetMasterClip() && navigation != nullptr && navigation->onMasterClip) {
+    return NavigateMasterClip(*navigation->onMasterClip);
   }
   if (!mSequence) {
     return false;
   }
+  const TickTime editLine = mTimeline->GetEditTime();
   switch (command) {
     case kMarkInCommand:
-      SequencePropertyActions::SetInPoint(mSequence, SnapToFrame(mEditLine));
+      SequencePropertyActions::SetInPoint(mSequence, SnapToFrame(editLine));
       return true;
     case kMarkOutCommand: {
-      const TickTime out = std::min(SnapToFrame(mEditLine), mRuler->GetEndTime());
+      const TickTime out = std::min(SnapToFrame(editLine), mRuler->GetEndTime());
       SequencePropertyActions::SetOutPoint(mSequence, out);
       return true;
     }
@@ -121,10 +126,10 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
       SequencePropertyActions::SetInOutPoints(mSequence, std::nullopt, std::nullopt);
       return true;
     case kAddMarkerCommand:
-      mMarkers.AddAt(mEditLine, 0);
+      mMarkers.AddAt(editLine, 0);
       return true;
     case kClearMarkerCommand:
-      mMarkers.RemoveSelectedAt(mEditLine);
+      mMarkers.RemoveSelectedAt(editLine);
       return true;
     case kClearAllMarkersCommand:
       mMarkers.ClearAll();
@@ -133,7 +138,7 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
     case kNextMarkerCommand:
     case kPreviousMarkerCommand: {
       const auto time =
-          command == kNextMarkerCommand ? mMarkers.Next(mEditLine) : mMarkers.Previous(mEditLine);
+          command == kNextMarkerCommand ? mMarkers.Next(editLine) : mMarkers.Previous(editLine);
       if (time) {
         SetEditTime(*time);
         mMarkers.SelectAt(*time);
@@ -143,12 +148,12 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
     }
     case kEditMarkerCommand:
       // The host has no marker editor yet: the marker at the edit line is selected for it.
-      mMarkers.SelectAt(mEditLine);
+      mMarkers.SelectAt(editLine);
       mRuler->Invalidate();
       return true;
     default:
       if (command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand) {
-        mMarkers.AddAt(mEditLine, command - kFirstColoredMarkerCommand);
+        mMarkers.AddAt(editLine, command - kFirstColoredMarkerCommand);
         return true;
       }
       return false;
@@ -171,23 +176,16 @@ bool EffectControlsView::IsEditingCommand(CommandID command) const {
     case kDeleteAllEffectsCommand:
     case kCommandPaste:
     case kCommandClear:
-    case kMarkInCommand:
-    case kMarkOutCommand:
-    case kClearInCommand:
-    case kClearOutCommand:
-    case kClearInOutCommand:
-    case kAddMarkerCommand:
-    case kClearMarkerCommand:
-    case kClearAllMarkersCommand:
-    case kEditMarkerCommand:
-    case kSequenceCommand11008:
+    case kSequenceEditCommand:
     case kBlendModeNormalCommand:
     case kBlendModeOtherCommand:
     case kCapsuleResetAllCommand:
       return true;
     default:
-      return (command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand) ||
-             (command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand);
+      if (const NavigationCommand* navigation = FindNavigationCommand(command)) {
+        return navigation->edits;
+      }
+      return command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand;
   }
 }
 
@@ -241,7 +239,7 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
       break;
   }
   if (IsNavigationCommand(command)) {
-    const bool target = mSequence != nullptr || mMasterClip != nullptr;
+    const bool target = mSequence != nullptr || GetMasterClip() != nullptr;
     status.enabled = target && (editable || !IsEditingCommand(command));
     return true;
   }
@@ -270,7 +268,7 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
         status = CommandStatus{};
       }
       return true;
-    case kSequenceCommand11008:
+    case kSequenceEditCommand:
     case kBlendModeNormalCommand:
     case kBlendModeOtherCommand:
     case kCapsuleResetAllCommand:
@@ -304,21 +302,22 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
       ToggleKeyframesVisible();
       return true;
     case kZoomInCommand:
-      ZoomToTimePerPixel(mTimePerPixel * 0.5, true);
+      ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel() * 0.5, true);
       return true;
     case kZoomOutCommand:
-      ZoomToTimePerPixel(mTimePerPixel * 2.0, true);
+      ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel() * 2.0, true);
       return true;
     case kPinToClipCommand:
       if (mTargetMode == kTargetClip) {
         mPinned = !mPinned;
         mKeyframeView->SetPinToClip(mPinned);
         SetupTimeBarZoomMinMax(mSelectedGroups);
-        const int K = std::max(1, mZoomLimiter.GetScrollWidth());
+        const int width = std::max(1, mZoomLimiter.GetScrollWidth());
         const TickTime span = mRuler->GetZoomOutTime() - mRuler->GetZoomInTime();
-        // Forces the re-application: the same value would keep the range as it is.
-        mTimePerPixel = -1.0;
-        ZoomToTimePerPixel(static_cast<double>(span) / kTicksPerSecond / K, true);
+        // The new limits place the range around the edit line even at the same zoom.
+        ApplyZoom(
+            mZoomLimiter.ClampTimePerPixel(static_cast<double>(span) / kTicksPerSecond / width),
+            true);
       }
       return true;
     case kAudioTimeUnitsCommand:
@@ -397,8 +396,8 @@ void EffectControlsView::SetAudioTimeUnits(bool audioUnits) {
   ReloadTimeDisplays();
   mRuler->SetAudioTimeUnits(audioUnits);
   // The list's audio frame alignment arrives with the keyframe area's audio-unit snapping.
-  if (mKeyframesVisible && mTimePerPixel > 0.0) {
-    ZoomToTimePerPixel(mTimePerPixel, false);
+  if (mKeyframesVisible && mTimeline->GetSecondsPerPixel() > 0.0) {
+    ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel(), false);
   }
 }
 

@@ -7,6 +7,7 @@
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Model/MasterClip.h"
 #include "Host/Model/ModelMessages.h"
 #include "Host/Model/Sequence.h"
@@ -151,7 +152,7 @@ void EffectControlsView::ListenToMessage(const Message& message) {
     }
   } else if (const auto* properties = message.As<PropertiesChangedMessage>()) {
     const bool ofSequence = mSequence && properties->objectID == mSequence->GetID();
-    const bool ofMasterClip = mMasterClip && properties->objectID == mMasterClip->GetID();
+    const bool ofMasterClip = GetMasterClip() && properties->objectID == GetMasterClip()->GetID();
     for (const std::string& key : properties->keys) {
       if ((ofSequence || ofMasterClip) &&
           (key == kPropertyKey_InPoint || key == kPropertyKey_OutPoint)) {
@@ -163,12 +164,7 @@ void EffectControlsView::ListenToMessage(const Message& message) {
     }
   } else if (const auto* position = message.As<PlayerPositionChangedMessage>()) {
     if (position->sequence == mSequence) {
-      mEditLine = position->time;
-      mRuler->SetCurrentTime(position->time);
-      mKeyframeView->SetEditTime(position->time);
-      if (mTimecode) {
-        mTimecode->SetTime(position->time);
-      }
+      ShowEditTime(position->time);
       if (mAudioPartPlaying) {
         BroadcastMessage(std::string(EffectControlsHandler::kAudioPlayerRelayStation),
                          AudioPlayerPositionChangedMessage(position->time));

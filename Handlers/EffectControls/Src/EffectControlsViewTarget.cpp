@@ -4,6 +4,7 @@
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/MasterClip.h"
 #include "Host/Model/Sequence.h"
@@ -112,7 +113,7 @@ void EffectControlsView::SequenceClipSelectionChanged(const SequenceRef& sequenc
   mTargetItem.reset();
   SetMasterClip(nullptr);
   mTargetMode = kTargetClip;
-  mEditLine = sequence->GetCurrentTime();
+  mTimeline->SetEditTime(sequence->GetCurrentTime());
   SetupTimeBarZoomMinMax(groups);
 
   TrackItemRef video;
@@ -136,11 +137,11 @@ void EffectControlsView::SequenceClipSelectionChanged(const SequenceRef& sequenc
     TargetClip(audio);
   } else {
     targeted = false;
-    mListView->SetVisibleKeyframeTime(0);
-    const int K = std::max(1, mZoomLimiter.GetScrollWidth());
+    mTimeline->SetVisibleStart(0);
+    const int width = std::max(1, mZoomLimiter.GetScrollWidth());
     const TickTime span = mRuler->GetZoomOutTime() - mRuler->GetZoomInTime();
     if (span > 0) {
-      mListView->SetTimePerPixel(static_cast<double>(span) / kTicksPerSecond / K);
+      mTimeline->SetSecondsPerPixel(static_cast<double>(span) / kTicksPerSecond / width);
     }
   }
   if (targeted) {
@@ -202,9 +203,7 @@ int EffectControlsView::SequenceClipSelectionChangedForMultipleTrackItems(
 void EffectControlsView::TargetClip(const TrackItemRef& item) {
   const auto [start, end] = GetTrackItemStartAndEnd(item);
   mTargetItem = item;
-  mClipStart = start;
-  mClipEnd = end;
-  mKeyframeView->SetClipSpan(start, end);
+  SetShownRange(start, end);
   if (end > start) {
     mRuler->SetZoomInOutTime(start, end);
   }
@@ -214,33 +213,32 @@ void EffectControlsView::TargetClip(const TrackItemRef& item) {
 void EffectControlsView::TargetTransition(const TrackItemRef& item) {
   mTargetMode = kTargetTransition;
   SetupTimeBarZoomMinMax(mSelectedGroups);
-  const TickTime s = item->GetStart();
-  const TickTime e = item->GetEnd();
-  const TickTime d = e - s;
+  const TickTime start = item->GetStart();
+  const TickTime end = item->GetEnd();
+  const TickTime duration = end - start;
   mTargetItem = item;
-  mClipStart = s;
-  mClipEnd = e;
-  mKeyframeView->SetClipSpan(s, e);
-  if (d > 0) {
-    mRuler->SetZoomInOutTime(std::max<TickTime>(0, s - d), e + d);
+  SetShownRange(start, end);
+  if (duration > 0) {
+    mRuler->SetZoomInOutTime(std::max<TickTime>(0, start - duration), end + duration);
   }
   mHeader->SetTransition(mSequence, item, NeighbourClip(item, true), NeighbourClip(item, false));
 }
 
+const MasterClipRef& EffectControlsView::GetMasterClip() const {
+  return mListView->GetMasterClip();
+}
+
 void EffectControlsView::SetMasterClip(const MasterClipRef& masterClip) {
-  if (masterClip == mMasterClip) {
+  if (masterClip == GetMasterClip()) {
     return;
   }
-  if (mMasterClip) {
-    RemoveListener(mMasterClip->GetStation(), *this);
+  if (GetMasterClip()) {
+    RemoveListener(GetMasterClip()->GetStation(), *this);
   }
-  mMasterClip = masterClip;
-  if (mMasterClip) {
+  mListView->SetMasterClip(masterClip);
+  if (masterClip) {
     // Its in and out points and name arrive on its own station.
-    AddListener(mMasterClip->GetStation(), *this);
-    mListView->SetMasterClip(mMasterClip);
-  } else {
-    mListView->ClearMasterClip();
+    AddListener(masterClip->GetStation(), *this);
   }
 }
 
@@ -263,7 +261,7 @@ void EffectControlsView::FinishClipSelection(int state) {
     mTargetMode = kTargetNone;
     mHeader->SetNoTarget(state);
     mZoomLimiter.SetMinMaxTime(0, 0);
-    mKeyframeView->SetClipSpan(0, 0);
+    SetShownRange(0, 0);
   }
   mRuler->SetEnabled(enabled);
   mZoomBar->SetEnabled(enabled);
@@ -309,14 +307,17 @@ void EffectControlsView::UpdateAudioButtons() {
 }
 
 void EffectControlsView::SetEditTime(TickTime time) {
-  mEditLine = time;
-  mRuler->SetCurrentTime(time);
-  mKeyframeView->SetEditTime(time);
-  if (mTimecode) {
-    mTimecode->SetTime(time);
-  }
+  ShowEditTime(time);
   if (mSequence && mSequence->GetCurrentTime() != time) {
     mSequence->SetCurrentTime(time);
+  }
+}
+
+void EffectControlsView::ShowEditTime(TickTime time) {
+  mTimeline->SetEditTime(time);
+  mRuler->SetCurrentTime(time);
+  if (mTimecode) {
+    mTimecode->SetTime(time);
   }
 }
 
@@ -335,17 +336,13 @@ void EffectControlsView::OnSequenceChanged(const SequenceRef& sequence, bool set
   const bool stillThere = target && sequence->Contains(target.get());
   if (sameSelection && stillThere && mTargetMode != kTargetNone && IsShown()) {
     if (mTargetMode == kTargetTransition) {
-      mClipStart = target->GetStart();
-      mClipEnd = target->GetEnd();
-      mKeyframeView->SetClipSpan(mClipStart, mClipEnd);
+      SetShownRange(target->GetStart(), target->GetEnd());
       SetVisibleRange(mRuler->GetZoomInTime(), mRuler->GetZoomOutTime());
     } else {
       const auto [start, end] = GetTrackItemStartAndEnd(target);
-      const bool moved = start != mClipStart || end != mClipEnd;
+      const bool moved = start != mTimeline->GetShownStart() || end != mTimeline->GetShownEnd();
       // The clip's band follows a trim or a move whether or not the area is pinned to it.
-      mClipStart = start;
-      mClipEnd = end;
-      mKeyframeView->SetClipSpan(start, end);
+      SetShownRange(start, end);
       if (mPinned && moved) {
         mRuler->SetTimeRange(0, sequence->GetEnd());
         SetupTimeBarZoomMinMax(mSelectedGroups);
@@ -353,7 +350,7 @@ void EffectControlsView::OnSequenceChanged(const SequenceRef& sequence, bool set
         SetEditTime(sequence->GetCurrentTime());
       } else if (!mPinned && sequence->GetEnd() != mSequenceEnd) {
         SetupTimeBarZoomMinMax(mSelectedGroups);
-        ZoomToTimePerPixel(mTimePerPixel, false);
+        ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel(), false);
       }
     }
     mKeyframeView->Invalidate();

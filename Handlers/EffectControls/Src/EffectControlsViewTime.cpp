@@ -5,6 +5,7 @@
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/MarkerActions.h"
 #include "Host/Model/MasterClip.h"
@@ -15,25 +16,74 @@
 #include "Host/Toolkit/HotTimecodeControl.h"
 #include "Host/Toolkit/TimeBarControl.h"
 
+namespace {
+
+// Where the edit line sits in the visible range, as a share of its width: at or below the left
+// zone a zoom holds the left edge, at or above the right zone the right edge.
+constexpr double kLeftEdgeZone = 0.18;
+constexpr double kRightEdgeZone = 0.82;
+
+// The start of the range after a zoom that keeps `editLine` in view. `shownIn`..`shownOut`: the
+// range before (not empty, holding the edit line); `exactSpan` and `span`: its length after, in
+// ticks exactly and rounded. In between the zones the edit line moves a third of the way
+// toward the middle.
+TickTime StartAroundEditLine(TickTime editLine, TickTime shownIn, TickTime shownOut,
+                             double exactSpan, TickTime span) {
+  const double share =
+      static_cast<double>(editLine - shownIn) / static_cast<double>(shownOut - shownIn);
+  if (share >= kRightEdgeZone) {
+    return shownOut - span;
+  }
+  if (share <= kLeftEdgeZone) {
+    return shownIn;
+  }
+  const double shareAfter = 0.5 - 2.0 * (0.5 - share) / 3.0;
+  return editLine - static_cast<TickTime>(std::llround(exactSpan * shareAfter));
+}
+
+// The seconds per pixel that show `span` ticks across `width` pixels (at least one).
+double SecondsPerPixelFor(TickTime span, int width) {
+  return static_cast<double>(span) / kTicksPerSecond / std::max(1, width);
+}
+
+}  // namespace
+
 // --- Zoom ---
 
+TickTime EffectControlsView::GetClipStart() const {
+  return mTimeline->GetShownStart();
+}
+
+TickTime EffectControlsView::GetClipEnd() const {
+  return mTimeline->GetShownEnd();
+}
+
+double EffectControlsView::GetTimePerPixel() const {
+  return mTimeline->GetSecondsPerPixel();
+}
+
+TickTime EffectControlsView::GetVisibleBaseTime() const {
+  return mTimeline->GetVisibleStart();
+}
+
 void EffectControlsView::ZoomToTimePerPixel(double secondsPerPixel, bool keepCurrentTime) {
-  const double s = mZoomLimiter.ClampTimePerPixel(secondsPerPixel);
-  const double D = mZoomLimiter.GetScrollWidth() * s * kTicksPerSecond;
-  const TickTime span = static_cast<TickTime>(std::llround(D));
-  const TickTime a = mRuler->GetZoomInTime();
-  const TickTime b = mRuler->GetZoomOutTime();
-  const TickTime W = b - a;
-  const TickTime t = mEditLine;
-  TickTime start = a;
-  if (t >= a && t <= b && W > 0 && s != mTimePerPixel && keepCurrentTime) {
-    const double f = static_cast<double>(t - a) / static_cast<double>(W);
-    if (f > 0.18 && f < 0.82) {
-      start = t - static_cast<TickTime>(std::llround(D * (0.5 - 2.0 * (0.5 - f) / 3.0)));
-    } else if (f >= 0.82) {
-      start = b - span;
-    }
+  const double limited = mZoomLimiter.ClampTimePerPixel(secondsPerPixel);
+  // The same zoom again leaves the range where it is.
+  ApplyZoom(limited, keepCurrentTime && limited != mTimeline->GetSecondsPerPixel());
+}
+
+void EffectControlsView::ApplyZoom(double secondsPerPixel, bool keepEditLine) {
+  const double exactSpan = mZoomLimiter.GetScrollWidth() * secondsPerPixel * kTicksPerSecond;
+  const TickTime span = static_cast<TickTime>(std::llround(exactSpan));
+  const TickTime shownIn = mRuler->GetZoomInTime();
+  const TickTime shownOut = mRuler->GetZoomOutTime();
+  const TickTime editLine = mTimeline->GetEditTime();
+  const bool editLineShown = editLine >= shownIn && editLine <= shownOut && shownOut > shownIn;
+  TickTime start = shownIn;
+  if (keepEditLine && editLineShown) {
+    start = StartAroundEditLine(editLine, shownIn, shownOut, exactSpan, span);
   }
+  // The range stays inside the limiter's; a range longer than it shows all of it.
   const TickTime minimum = mZoomLimiter.GetMinTime();
   const TickTime maximum = mZoomLimiter.GetMaxTime();
   TickTime end = AddTimes(start, span);
@@ -48,11 +98,9 @@ void EffectControlsView::ZoomToTimePerPixel(double secondsPerPixel, bool keepCur
     end = maximum;
   }
   start = mZoomLimiter.ClampTime(start);
-  mVisibleBaseTime = start;
-  mTimePerPixel = s;
+  mTimeline->SetVisibleStart(start);
+  mTimeline->SetSecondsPerPixel(secondsPerPixel);
   UpdateHorizontalScroll();
-  mListView->SetVisibleKeyframeTime(start);
-  mListView->SetTimePerPixel(s);
   mKeyframeView->Invalidate();
   if (end > start) {
     mRuler->SetZoomInOutTime(start, end);
@@ -62,15 +110,13 @@ void EffectControlsView::ZoomToTimePerPixel(double secondsPerPixel, bool keepCur
 void EffectControlsView::ApplyRulerZoom() {
   const TickTime zoomIn = mRuler->GetZoomInTime();
   const TickTime zoomOut = mRuler->GetZoomOutTime();
-  const int K = std::max(1, mZoomLimiter.GetScrollWidth());
   if (zoomOut <= zoomIn) {
     return;
   }
-  mVisibleBaseTime = zoomIn;
-  mTimePerPixel = static_cast<double>(zoomOut - zoomIn) / kTicksPerSecond / K;
+  mTimeline->SetVisibleStart(zoomIn);
+  mTimeline->SetSecondsPerPixel(
+      SecondsPerPixelFor(zoomOut - zoomIn, mZoomLimiter.GetScrollWidth()));
   UpdateHorizontalScroll();
-  mListView->SetVisibleKeyframeTime(zoomIn);
-  mListView->SetTimePerPixel(mTimePerPixel);
   mKeyframeView->Invalidate();
 }
 
@@ -91,7 +137,7 @@ void EffectControlsView::ScrollVisibleTime(TickTime ticks) {
 }
 
 void EffectControlsView::UpdateHorizontalScroll() {
-  const double ticksPerPixel = mTimePerPixel * kTicksPerSecond;
+  const double ticksPerPixel = mTimeline->GetSecondsPerPixel() * kTicksPerSecond;
   if (!(ticksPerPixel > 0.0)) {
     mScrollRange = -1;
     mScrollPosition = -1;
@@ -100,7 +146,7 @@ void EffectControlsView::UpdateHorizontalScroll() {
   }
   double range = static_cast<double>(mZoomLimiter.GetDuration()) / ticksPerPixel;
   double position =
-      static_cast<double>(mVisibleBaseTime - mZoomLimiter.GetMinTime()) / ticksPerPixel;
+      static_cast<double>(mTimeline->GetVisibleStart() - mZoomLimiter.GetMinTime()) / ticksPerPixel;
   if (range > kMaxScrollRange) {
     mScrollScale = range / kMaxScrollRange;
     range = range / mScrollScale + 0.5;
@@ -117,11 +163,12 @@ void EffectControlsView::SetVisibleRange(TickTime start, TickTime end) {
     return;
   }
   mRuler->SetZoomInOutTime(start, end);
-  const int K = std::max(1, mZoomLimiter.GetScrollWidth());
-  const double s = static_cast<double>(end - start) / kTicksPerSecond / K;
-  if (s > 0.0) {
-    ZoomToTimePerPixel(s, false);
-  }
+  ZoomToTimePerPixel(SecondsPerPixelFor(end - start, mZoomLimiter.GetScrollWidth()), false);
+}
+
+void EffectControlsView::SetShownRange(TickTime start, TickTime end) {
+  mTimeline->SetShownRange(start, end);
+  mKeyframeView->Invalidate();
 }
 
 std::pair<TickTime, TickTime> EffectControlsView::GetTrackItemStartAndEnd(
@@ -146,14 +193,14 @@ void EffectControlsView::SetupTimeBarZoomMinMax(const std::vector<TrackItemGroup
             ? group.videoItems.front()
             : (!group.audioItems.empty() ? group.audioItems.front() : nullptr);
     if (item && item->IsTransition()) {
-      const TickTime d = item->GetDuration();
-      TickTime low = item->GetStart() - d;
-      TickTime high = item->GetEnd() + d;
+      const TickTime duration = item->GetDuration();
+      TickTime low = item->GetStart() - duration;
+      TickTime high = item->GetEnd() + duration;
       if (const TrackItemRef outgoing = NeighbourClip(item, true)) {
-        low = std::min(low, outgoing->GetStart() - d);
+        low = std::min(low, outgoing->GetStart() - duration);
       }
       if (const TrackItemRef incoming = NeighbourClip(item, false)) {
-        high = std::max(high, incoming->GetEnd() + d);
+        high = std::max(high, incoming->GetEnd() + duration);
       }
       minimum = std::max<TickTime>(0, low);
       maximum = high;
@@ -206,8 +253,9 @@ void EffectControlsView::ReloadTimeDisplays() {
 }
 
 TrackItemRef EffectControlsView::GetMasterClipItem() const {
-  return mMasterClip && mTargetItem && mTargetItem->GetMasterClip() == mMasterClip ? mTargetItem
-                                                                                   : nullptr;
+  return GetMasterClip() && mTargetItem && mTargetItem->GetMasterClip() == GetMasterClip()
+             ? mTargetItem
+             : nullptr;
 }
 
 void EffectControlsView::ReloadInOutMarks() {
@@ -215,10 +263,10 @@ void EffectControlsView::ReloadInOutMarks() {
   std::optional<TickTime> out;
   if (const TrackItemRef item = GetMasterClipItem()) {
     // The master clip's points are media times; the ruler shows them where the clip plays them.
-    if (const auto clipIn = mMasterClip->GetInPoint()) {
+    if (const auto clipIn = GetMasterClip()->GetInPoint()) {
       in = item->ClipTimeToSequenceTime(*clipIn);
     }
-    if (const auto clipOut = mMasterClip->GetOutPoint()) {
+    if (const auto clipOut = GetMasterClip()->GetOutPoint()) {
       out = item->ClipTimeToSequenceTime(*clipOut);
     }
   } else if (mSequence) {
@@ -269,11 +317,11 @@ void EffectControlsView::OnMarkTime(const Message& message) {
       return time ? std::optional<TickTime>(item->SequenceTimeToClipTime(*time)) : time;
     };
     if (setIn && setOut) {
-      SequencePropertyActions::SetInOutPoints(mMasterClip, toClip(in), toClip(out));
+      SequencePropertyActions::SetInOutPoints(GetMasterClip(), toClip(in), toClip(out));
     } else if (setIn) {
-      SequencePropertyActions::SetInPoint(mMasterClip, toClip(in));
+      SequencePropertyActions::SetInPoint(GetMasterClip(), toClip(in));
     } else if (setOut) {
-      SequencePropertyActions::SetOutPoint(mMasterClip, toClip(out));
+      SequencePropertyActions::SetOutPoint(GetMasterClip(), toClip(out));
     }
   } else if (mSequence) {
     if (setIn && setOut) {
@@ -288,47 +336,48 @@ void EffectControlsView::OnMarkTime(const Message& message) {
   ReloadInOutMarks();
 }
 
-bool EffectControlsView::NavigateMasterClip(int code) {
+bool EffectControlsView::NavigateMasterClip(MasterClipNavigation code) {
   const TrackItemRef item = GetMasterClipItem();
   if (!item) {
     return false;
   }
-  const TickTime clipTime = item->SequenceTimeToClipTime(mEditLine);
+  const TickTime clipTime = item->SequenceTimeToClipTime(mTimeline->GetEditTime());
   const auto goTo = [this, &item](TickTime time) {
     SetEditTime(item->ClipTimeToSequenceTime(time));
     return true;
   };
   switch (code) {
     case kNavMarkIn:
-      return SequencePropertyActions::SetInPoint(mMasterClip, clipTime) == EditStatus::Done;
+      return SequencePropertyActions::SetInPoint(GetMasterClip(), clipTime) == EditStatus::Done;
     case kNavMarkOut:
-      return SequencePropertyActions::SetOutPoint(mMasterClip, clipTime) == EditStatus::Done;
+      return SequencePropertyActions::SetOutPoint(GetMasterClip(), clipTime) == EditStatus::Done;
     case kNavGoToIn:
-      return goTo(mMasterClip->GetInPoint().value_or(0));
+      return goTo(GetMasterClip()->GetInPoint().value_or(0));
     case kNavGoToOut:
-      if (const auto out = mMasterClip->GetOutPoint()) {
+      if (const auto out = GetMasterClip()->GetOutPoint()) {
         return goTo(*out);
       }
       return false;
     case kNavClearIn:
-      return SequencePropertyActions::SetInPoint(mMasterClip, std::nullopt) == EditStatus::Done;
+      return SequencePropertyActions::SetInPoint(GetMasterClip(), std::nullopt) == EditStatus::Done;
     case kNavClearOut:
-      return SequencePropertyActions::SetOutPoint(mMasterClip, std::nullopt) == EditStatus::Done;
+      return SequencePropertyActions::SetOutPoint(GetMasterClip(), std::nullopt) ==
+             EditStatus::Done;
     case kNavClearInOut:
-      return SequencePropertyActions::SetInOutPoints(mMasterClip, std::nullopt, std::nullopt) ==
+      return SequencePropertyActions::SetInOutPoints(GetMasterClip(), std::nullopt, std::nullopt) ==
              EditStatus::Done;
     case kNavNextMarker:
-      if (const auto next = mMasterClip->GetMarkers().NextMarkerTime(clipTime)) {
+      if (const auto next = GetMasterClip()->GetMarkers().NextMarkerTime(clipTime)) {
         return goTo(*next);
       }
       return false;
     case kNavPreviousMarker:
-      if (const auto previous = mMasterClip->GetMarkers().PreviousMarkerTime(clipTime)) {
+      if (const auto previous = GetMasterClip()->GetMarkers().PreviousMarkerTime(clipTime)) {
         return goTo(*previous);
       }
       return false;
     case kNavClearAllMarkers:
-      return MarkerActions::ClearAllMarkers(mMasterClip) == EditStatus::Done;
+      return MarkerActions::ClearAllMarkers(GetMasterClip()) == EditStatus::Done;
     default:
       return false;
   }

@@ -92,7 +92,7 @@ FilterItem::FilterItem(MediaType mediaType, ComponentRef component, TrackItemRef
     mOffline = mComponent->IsOffline();
     mEnabled = mComponent->IsEnabled();
     mHasSetup = mComponent->HasSetupDialog() &&
-                !(options.option6 && mComponent->GetMediaType() == ::MediaType::Video);
+                !(options.noVideoSetupButton && mComponent->GetMediaType() == ::MediaType::Video);
     mComponentStation = mComponent->GetStation();
   }
   mReadOnly = ComputeReadOnly(mTrackItem, mMasterClip, mComponent);

@@ -8,7 +8,7 @@ struct FilterItemOptions {
   // The on/off switch is a check box at the right edge instead of the picture button at the left.
   bool checkboxSwitch = false;
   // Video effects skip their setup-dialog button.
-  bool option6 = false;
+  bool noVideoSetupButton = false;
   // Extra left indent of the row, in pixels (40 for lists that indent their effects, else 0).
   int indent = 0;
   // The row starts collapsed unless the effect remembers it open.

@@ -448,14 +448,14 @@ namespace {
 
 TEST_F(ListViewTest, StyleBitsReachTheEffectRowsOptions) {
   list->SetStyle(kStyleCheckboxSwitch | kStyleIndentFilters | kStyleStartCollapsed |
-                 kStyleNoFilterIndent | kStyleFilterOption6);
+                 kStyleNoFilterIndent | kStyleNoVideoSetupButton);
   EXPECT_TRUE(list->HasECPStyle(kStyleIndentFilters | kStyleNoAudio));
   EXPECT_FALSE(list->HasECPStyle(kStyleNoAudio | kStyleNoMaskControls));
   Select({AddClip(v1, {Make(kMatchName_Opacity)})});
   const FilterItemOptions& options = Filter(list->GetVideoItems(), 0).GetOptions();
   EXPECT_TRUE(options.topLevel);
   EXPECT_TRUE(options.checkboxSwitch);
-  EXPECT_TRUE(options.option6);
+  EXPECT_TRUE(options.noVideoSetupButton);
   EXPECT_EQ(options.indent, 40);
   EXPECT_TRUE(options.startCollapsed);
   EXPECT_TRUE(options.noIndent);

@@ -1,9 +1,9 @@
 #include <cstdlib>
 #include <filesystem>
-#include <limits>
 #include <set>
 
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Model/ComponentParam.h"
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/Image.h"
@@ -249,27 +249,17 @@ TEST_F(ListLayoutTest, DisclosureChangeMovesTheRowsBelowAndAnnouncesIt) {
   EXPECT_EQ(list->GetMaxHeight(), 21 + 2 * EffectItem::kFolderTitleHeight + 2);
 }
 
-TEST_F(ListLayoutTest, TimePerPixelKeepsThePixelFrameRateInStep) {
+TEST_F(ListLayoutTest, TheZoomSettersWriteTheTimelineTheRowsAndKeyframeAreaRead) {
+  // The refusals and the pixel frame rate are the timeline's (PanelTimelineTest).
   EXPECT_TRUE(list->SetTimePerPixel(0.5));
   EXPECT_FALSE(list->SetTimePerPixel(0.5));
-  EXPECT_EQ(list->GetPixelFrameRate().GetTicksPerFrame(), kTicksPerSecond / 2);
-  EXPECT_TRUE(list->SetTimePerPixel(1.0 / 30.0));
-  EXPECT_EQ(list->GetPixelFrameRate().GetTicksPerFrame(), 8467200000);
-
-  // Not a duration: refused, the state stays.
   EXPECT_FALSE(list->SetTimePerPixel(0.0));
-  EXPECT_FALSE(list->SetTimePerPixel(-1.0));
-  EXPECT_FALSE(list->SetTimePerPixel(std::numeric_limits<double>::quiet_NaN()));
-  EXPECT_DOUBLE_EQ(list->GetTimePerPixel(), 1.0 / 30.0);
-  // A pixel of no time at all in 1 / time per pixel saturates instead of overflowing.
-  EXPECT_TRUE(list->SetTimePerPixel(std::numeric_limits<double>::infinity()));
-  EXPECT_EQ(list->GetPixelFrameRate().GetTicksPerFrame(), std::numeric_limits<TickTime>::max());
-  EXPECT_TRUE(list->SetTimePerPixel(1e-15));
-  EXPECT_EQ(list->GetPixelFrameRate().GetTicksPerFrame(), 1);
+  EXPECT_DOUBLE_EQ(list->GetTimeline().GetSecondsPerPixel(), 0.5);
+  EXPECT_EQ(list->GetPixelFrameRate().GetTicksPerFrame(), kTicksPerSecond / 2);
 
   EXPECT_TRUE(list->SetVisibleKeyframeTime(5 * kSecond));
   EXPECT_FALSE(list->SetVisibleKeyframeTime(5 * kSecond));
-  EXPECT_EQ(list->GetVisibleKeyframeTime(), 5 * kSecond);
+  EXPECT_EQ(list->GetTimeline().GetVisibleStart(), 5 * kSecond);
 }
 
 TEST_F(ListLayoutTest, SelectedEffectTitleIsFilledWithTheSelectionColour) {
@@ -360,7 +350,7 @@ TEST_F(ListLayoutTest, TheWideNameStyleMovesASelectedParametersNameBand) {
   EXPECT_TRUE(isSelected(400 / 2 - 20 + indent - 1));
   EXPECT_FALSE(isSelected(400 / 2 - 20 + indent + 1));
 
-  list->SetStyle(kStyleFlag2000);
+  list->SetStyle(kStyleWideParameterNames);
   host->InvalidateAll();
   host->Render();
   // From 10 px to three quarters of the width, less 30.

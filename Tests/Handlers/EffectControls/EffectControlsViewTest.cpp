@@ -9,9 +9,12 @@
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
 #include "Handlers/EffectControls/Src/EffectControlsView.h"
+#include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/MessagingTestScope.h"
 #include "Host/Messaging/PropertyList.h"
+#include "Host/Model/ComponentChain.h"
+#include "Host/Model/EffectCatalogue.h"
 #include "Host/Model/MasterClip.h"
 #include "Host/Model/Media.h"
 #include "Host/Model/Project.h"
@@ -19,7 +22,9 @@
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/TransitionData.h"
+#include "Host/Rows/ParameterControl.h"
 #include "Host/Toolkit/ColorManager.h"
+#include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/MultiPictureButton.h"
 #include "Host/Toolkit/ScrollBar.h"
 #include "Host/Toolkit/TimeBarControl.h"
@@ -292,6 +297,61 @@ TEST_F(PanelViewTest, TheDumpNamesTheTargetAndTheKeyframeTimeState) {
   ASSERT_TRUE(dump.keyframeArea.has_value());
   EXPECT_EQ(dump.keyframeArea->visibleStartTime, 2 * kSec);
   EXPECT_GT(dump.keyframeArea->secondsPerPixel, 0.0);
+}
+
+}  // namespace
+
+namespace {
+
+using namespace panel_view_test;
+
+// The first parameter row under the list's video rows.
+const ParameterControl* FirstParameterRow(const EffectControlsListView& list) {
+  const ParameterControl* found = nullptr;
+  list.GetVideoItems().ForEachRow([&found](const EffectItemList::Row& row) {
+    found = dynamic_cast<const ParameterControl*>(row.get());
+    return found == nullptr;
+  });
+  return found;
+}
+
+// The edit line used to be copied into the list when the sequence was first shown and never
+// after: a value typed later landed at that old time.
+TEST_F(PanelViewTest, TheRowsAndTheKeyframeAreaReadTheEditLineWhereverItMoves) {
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 12 * kSec);
+  clip->GetComponentChain()->Append(EffectCatalogue::Standard().Create(kMatchName_Opacity));
+  Open({800, 400});
+  sequence->SetSelection({clip});
+  const ParameterControl* row = FirstParameterRow(*view->GetListView());
+  ASSERT_NE(row, nullptr);
+
+  sequence->SetCurrentTime(5 * kSec);
+  EXPECT_EQ(view->GetTimeline().GetEditTime(), 5 * kSec);
+  EXPECT_EQ(view->GetListView()->GetEditTime(), 5 * kSec);
+  EXPECT_EQ(view->GetKeyframeView()->GetEditTime(), 5 * kSec);
+  EXPECT_EQ(row->GetEditTime(), 5 * kSec);
+
+  // Moved from the panel's own ruler: the sequence follows too.
+  BroadcastMessage(view->GetTimeRuler()->GetStation(), EditTimeChangedMessage(9 * kSec));
+  EXPECT_EQ(sequence->GetCurrentTime(), 9 * kSec);
+  EXPECT_EQ(row->GetEditTime(), 9 * kSec);
+  EXPECT_EQ(view->GetKeyframeView()->GetEditTime(), 9 * kSec);
+}
+
+TEST_F(PanelViewTest, TheKeyframeAreaDrawsTheSpanOfTheClipTheViewTargets) {
+  const TrackItemRef clip = AddClip(v1, 2 * kSec, 12 * kSec);
+  const TrackItemRef other = AddClip(v1, 20 * kSec, 26 * kSec);
+  Open({800, 400});
+  sequence->SetSelection({clip});
+  EXPECT_EQ(view->GetTimeline().GetShownStart(), 2 * kSec);
+  EXPECT_EQ(view->GetTimeline().GetShownEnd(), 12 * kSec);
+  sequence->SetSelection({other});
+  EXPECT_EQ(view->GetClipStart(), 20 * kSec);
+  EXPECT_EQ(view->GetClipEnd(), 26 * kSec);
+  // Nothing targeted: no band.
+  sequence->SetSelection({});
+  EXPECT_EQ(view->GetTimeline().GetShownStart(), 0);
+  EXPECT_EQ(view->GetTimeline().GetShownEnd(), 0);
 }
 
 }  // namespace

@@ -356,7 +356,7 @@ TEST_F(FilterItemTest, TheSetupButtonReportsThatTheHostCannotRunSetupDialogs) {
 TEST_F(FilterItemTest, OptionSixLeavesVideoEffectsWithoutSetupButton) {
   effect->SetHasSetupDialog(true);
   FilterItemOptions options;
-  options.option6 = true;
+  options.noVideoSetupButton = true;
   row = MakeRow(options);
   EXPECT_EQ(row->GetSetupButton(), nullptr);
   EXPECT_FALSE(row->HasSetup());
