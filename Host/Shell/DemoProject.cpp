@@ -1,17 +1,9 @@
 #include "Host/Shell/DemoProject.h"
 
-#include <string>
-#include <utility>
-
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentChain.h"
-#include "Host/Model/ComponentParam.h"
 #include "Host/Model/EffectCatalogue.h"
-#include "Host/Model/MasterClip.h"
-#include "Host/Model/Media.h"
-#include "Host/Model/Project.h"
-#include "Host/Model/Sequence.h"
-#include "Host/Model/Track.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/TrackItem.h"
 
 namespace {
@@ -20,45 +12,10 @@ constexpr TickTime Seconds(double s) {
   return static_cast<TickTime>(s * kTicksPerSecond);
 }
 
-// Keyframes at (clip time, value) pairs; the parameter becomes time-varying.
-void AddKeyframes(const ComponentParamRef& param,
-                  std::initializer_list<std::pair<TickTime, double>> keys) {
-  if (param == nullptr)
-    return;
-  ComponentParam::State state = param->GetState();
-  state.timeVarying = true;
-  param->ApplyState(std::move(state));
-  for (const auto& [time, value] : keys)
-    param->SetValueAt(time, value);
-}
-
-TrackItemRef MakeVideoClip(ObjectID id, const MasterClipRef& clip, TickTime start, TickTime end,
-                           TickTime mediaIn, int link, bool keyed) {
-  TrackItemRef item = TrackItem::CreateClip(MediaType::Video, start, end, clip, mediaIn);
-  item->SetID(id);
-  item->SetLinkGroup(link);
-  const EffectCatalogue& catalogue = EffectCatalogue::Standard();
-  for (const ComponentRef& intrinsic : catalogue.CreateIntrinsics(MediaType::Video))
-    item->GetComponentChain()->Append(intrinsic);
-  item->GetComponentChain()->Append(catalogue.Create(kMatchName_GaussianBlur));
-  if (keyed) {
-    const ComponentChainRef& chain = item->GetComponentChain();
-    AddKeyframes(chain->FindByMatchName(kMatchName_Motion)->FindParam("Scale"),
-                 {{mediaIn, 100.0}, {mediaIn + Seconds(2), 120.0}});
-    AddKeyframes(chain->FindByMatchName(kMatchName_Opacity)->FindParam("Opacity"),
-                 {{mediaIn, 0.0}, {mediaIn + Seconds(1), 100.0}});
-  }
-  return item;
-}
-
-TrackItemRef MakeAudioClip(ObjectID id, const MasterClipRef& clip, TickTime start, TickTime end,
-                           TickTime mediaIn, int link) {
-  TrackItemRef item = TrackItem::CreateClip(MediaType::Audio, start, end, clip, mediaIn);
-  item->SetID(id);
-  item->SetLinkGroup(link);
-  for (const ComponentRef& intrinsic :
-       EffectCatalogue::Standard().CreateIntrinsics(MediaType::Audio))
-    item->GetComponentChain()->Append(intrinsic);
+TrackItemRef AddVideoClip(ProjectBuilder& builder, const TrackRef& track, const MasterClipRef& clip,
+                          const ProjectBuilder::ClipSpec& spec) {
+  TrackItemRef item = builder.AddClip(track, clip, spec);
+  builder.AddEffect(item, kMatchName_GaussianBlur);
   return item;
 }
 
@@ -68,34 +25,44 @@ ProjectRef BuildDemoProject() {
   // The fixed ids below must not collide with ids handed out later in this process.
   ModelObject::ReserveObjectIDsThrough(1000);
 
-  ProjectRef project = Project::Create("Demo");
-  const MasterClipRef beach =
-      MasterClip::Create("Beach.mov", Media::Create("Beach.mov", Seconds(20), true, true));
-  const MasterClipRef sunset =
-      MasterClip::Create("Sunset.mov", Media::Create("Sunset.mov", Seconds(15), true, true));
-  project->AddMasterClip(beach);
-  project->AddMasterClip(sunset);
+  ProjectBuilder builder("Demo");
+  using Streams = ProjectBuilder::Streams;
+  const MasterClipRef beach = builder.AddMasterClip(
+      "Beach.mov", builder.AddMedia("Beach.mov", Seconds(20), Streams::VideoAndAudio));
+  const MasterClipRef sunset = builder.AddMasterClip(
+      "Sunset.mov", builder.AddMedia("Sunset.mov", Seconds(15), Streams::VideoAndAudio));
 
-  SequenceRef sequence = Sequence::Create("Demo Sequence", kFrameRate_25, kFrameRate_Audio48000);
-  const TrackRef video = Track::Create(MediaType::Video, "V1");
-  const TrackRef audio = Track::Create(MediaType::Audio, "A1");
-  sequence->AddTrack(video);
-  sequence->AddTrack(audio);
+  const SequenceRef sequence =
+      builder.AddSequence("Demo Sequence", kFrameRate_25, kFrameRate_Audio48000);
+  const TrackRef video = builder.AddTrack(sequence, MediaType::Video, "V1");
+  const TrackRef audio = builder.AddTrack(sequence, MediaType::Audio, "A1");
 
-  video->AddItem(MakeVideoClip(kDemoVideoClipA, beach, 0, Seconds(5), Seconds(2), 1, true));
-  video->AddItem(MakeVideoClip(kDemoVideoClipB, sunset, Seconds(5), Seconds(10), 0, 2, false));
+  const TrackItemRef clipA = AddVideoClip(builder, video, beach,
+                                          {.start = 0,
+                                           .end = Seconds(5),
+                                           .mediaIn = Seconds(2),
+                                           .linkGroup = 1,
+                                           .id = kDemoVideoClipA});
+  const ComponentChainRef& chain = clipA->GetComponentChain();
+  const TickTime mediaIn = clipA->GetMediaIn();
+  ProjectBuilder::AddKeyframes(chain->FindByMatchName(kMatchName_Motion)->FindParam("Scale"),
+                               {{mediaIn, 100.0}, {mediaIn + Seconds(2), 120.0}});
+  ProjectBuilder::AddKeyframes(chain->FindByMatchName(kMatchName_Opacity)->FindParam("Opacity"),
+                               {{mediaIn, 0.0}, {mediaIn + Seconds(1), 100.0}});
+  AddVideoClip(builder, video, sunset,
+               {.start = Seconds(5), .end = Seconds(10), .linkGroup = 2, .id = kDemoVideoClipB});
   TransitionData dissolve;
   dissolve.matchName = "XO.KRVN CrossDissolve";
   dissolve.displayName = "Cross Dissolve";
-  TrackItemRef transition =
-      TrackItem::CreateTransition(MediaType::Video, Seconds(4.5), Seconds(5.5), dissolve);
-  transition->SetID(kDemoTransition);
-  video->AddItem(transition);
+  builder.AddTransition(video, Seconds(4.5), Seconds(5.5), dissolve, kDemoTransition);
 
-  audio->AddItem(MakeAudioClip(kDemoAudioClipA, beach, 0, Seconds(5), Seconds(2), 1));
-  audio->AddItem(MakeAudioClip(kDemoAudioClipB, sunset, Seconds(5), Seconds(10), 0, 2));
-
-  project->AddSequence(sequence);
-  project->SetActiveSequence(sequence);
-  return project;
+  builder.AddClip(audio, beach,
+                  {.start = 0,
+                   .end = Seconds(5),
+                   .mediaIn = Seconds(2),
+                   .linkGroup = 1,
+                   .id = kDemoAudioClipA});
+  builder.AddClip(audio, sunset,
+                  {.start = Seconds(5), .end = Seconds(10), .linkGroup = 2, .id = kDemoAudioClipB});
+  return builder.GetProject();
 }

@@ -15,8 +15,8 @@
 #include "Host/Model/ComponentParamActions.h"
 #include "Host/Model/EffectCatalogue.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
-#include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Toolkit/FloatSliderControl.h"
@@ -36,11 +36,8 @@ const std::string kMinusInfinity = "-\xE2\x88\x9E";
 class AudioSliderRowTest : public ::testing::Test {
  protected:
   AudioSliderRowTest() {
-    project->AddSequence(sequence);
-    sequence->AddTrack(track);
-    track->AddItem(clip);
-    clip->GetComponentChain()->Append(volume);
-    clip->GetComponentChain()->Append(delay);
+    builder.AddComponent(clip->GetComponentChain(), volume);
+    builder.AddComponent(clip->GetComponentChain(), delay);
     host.SetRootView(listView);
     *editTime = 12 * kSec;
   }
@@ -85,11 +82,13 @@ class AudioSliderRowTest : public ::testing::Test {
   std::vector<std::string> UndoNames() { return project->GetUndoStack().GetUndoNames(); }
 
   MessagingTestScope messaging;
-  ProjectRef project = Project::Create("Audio rows");
-  SequenceRef sequence = Sequence::Create("Sequence");
-  TrackRef track = Track::Create(MediaType::Audio, "A1");
-  TrackItemRef clip =
-      TrackItem::CreateClip(MediaType::Audio, 10 * kSec, 20 * kSec, nullptr, 5 * kSec);
+  ProjectBuilder builder{"Audio rows"};
+  ProjectRef project = builder.GetProject();
+  SequenceRef sequence = builder.AddSequence("Sequence");
+  TrackRef track = builder.AddTrack(sequence, MediaType::Audio, "A1");
+  TrackItemRef clip = builder.AddClip(
+      track, nullptr,
+      {.start = 10 * kSec, .end = 20 * kSec, .mediaIn = 5 * kSec, .withIntrinsics = false});
   ComponentRef volume = EffectCatalogue::Standard().Create(kMatchName_Volume);
   ComponentRef delay = EffectCatalogue::Standard().Create(kMatchName_Delay);
   std::shared_ptr<TickTime> editTime = std::make_shared<TickTime>(0);

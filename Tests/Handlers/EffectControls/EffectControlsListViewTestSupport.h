@@ -6,6 +6,7 @@
 #include <memory>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "Handlers/EffectControls/Public/EffectControlsListScroller.h"
@@ -22,6 +23,7 @@
 #include "Host/Model/MasterClip.h"
 #include "Host/Model/Media.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
@@ -90,20 +92,13 @@ class ListViewTest : public ::testing::Test {
     ColorManager::RegisterColorSet(
         "EFFECTCONTROLSCOLORS",
         ReadTextFile("Handlers/EffectControls/Resources/EffectControlsColors.txt"));
-    project = Project::Create("List");
-    sequence = Sequence::Create("Sequence 01", kFrameRate_25);
-    project->AddSequence(sequence);
-    project->SetActiveSequence(sequence);
-    v1 = Track::Create(MediaType::Video, "V1");
-    a1 = Track::Create(MediaType::Audio, "A1");
-    a2 = Track::Create(MediaType::Audio, "A2");
-    a3 = Track::Create(MediaType::Audio, "A3");
-    for (const TrackRef& track : {v1, a1, a2, a3}) {
-      sequence->AddTrack(track);
-    }
-    media = Media::Create("interview.mov", 60 * kSecond, true, true);
-    masterClip = MasterClip::Create("Interview", media);
-    project->AddMasterClip(masterClip);
+    sequence = builder.AddSequence("Sequence 01", kFrameRate_25);
+    v1 = builder.AddTrack(sequence, MediaType::Video, "V1");
+    a1 = builder.AddTrack(sequence, MediaType::Audio, "A1");
+    a2 = builder.AddTrack(sequence, MediaType::Audio, "A2");
+    a3 = builder.AddTrack(sequence, MediaType::Audio, "A3");
+    media = builder.AddMedia("interview.mov", 60 * kSecond, ProjectBuilder::Streams::VideoAndAudio);
+    masterClip = builder.AddMasterClip("Interview", media);
     list = std::make_shared<CountingListView>(nullptr, "EffectControlsTest.List");
   }
 
@@ -125,12 +120,9 @@ class ListViewTest : public ::testing::Test {
   // A clip on `track` with the given components (intrinsics are not added by themselves).
   TrackItemRef AddClip(const TrackRef& track, std::vector<ComponentRef> components,
                        TickTime start = 2 * kSecond, TickTime end = 7 * kSecond) {
-    TrackItemRef item = TrackItem::CreateClip(track->GetMediaType(), start, end, masterClip);
-    for (const ComponentRef& component : components) {
-      item->GetComponentChain()->Append(component);
-    }
-    track->AddItem(item);
-    return item;
+    return builder.AddClip(
+        track, masterClip,
+        {.start = start, .end = end, .withIntrinsics = false, .effects = std::move(components)});
   }
   ComponentRef Make(const char* matchName) const { return Catalogue().Create(matchName); }
 
@@ -159,7 +151,8 @@ class ListViewTest : public ::testing::Test {
 
   // Declared first: outlives everything that listens.
   MessagingTestScope messaging;
-  ProjectRef project;
+  ProjectBuilder builder{"List"};
+  ProjectRef project = builder.GetProject();
   SequenceRef sequence;
   TrackRef v1, a1, a2, a3;
   MediaRef media;

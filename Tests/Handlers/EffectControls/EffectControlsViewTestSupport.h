@@ -13,6 +13,7 @@
 #include "Host/Model/MasterClip.h"
 #include "Host/Model/Media.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
@@ -40,17 +41,11 @@ class PanelViewTest : public ::testing::Test {
  protected:
   PanelViewTest() {
     ColorManager::ResetForTesting();
-    project = Project::Create("Panel");
-    sequence = Sequence::Create("Sequence 01", kFrameRate_25);
-    project->AddSequence(sequence);
-    project->SetActiveSequence(sequence);
-    v1 = Track::Create(MediaType::Video, "V1");
-    a1 = Track::Create(MediaType::Audio, "A1");
-    sequence->AddTrack(v1);
-    sequence->AddTrack(a1);
-    media = Media::Create("Beach.mov", 600 * kSec, true, true);
-    master = MasterClip::Create("Beach.mov", media);
-    project->AddMasterClip(master);
+    sequence = builder.AddSequence("Sequence 01", kFrameRate_25);
+    v1 = builder.AddTrack(sequence, MediaType::Video, "V1");
+    a1 = builder.AddTrack(sequence, MediaType::Audio, "A1");
+    media = builder.AddMedia("Beach.mov", 600 * kSec, ProjectBuilder::Streams::VideoAndAudio);
+    master = builder.AddMasterClip("Beach.mov", media);
   }
 
   ~PanelViewTest() override {
@@ -72,18 +67,15 @@ class PanelViewTest : public ::testing::Test {
   }
 
   TrackItemRef AddClip(const TrackRef& track, TickTime start, TickTime end, int link = 0) {
-    TrackItemRef item = TrackItem::CreateClip(track->GetMediaType(), start, end, master);
-    track->AddItem(item);
-    if (link != 0) {
-      item->SetLinkGroup(link);
-    }
-    return item;
+    return builder.AddClip(
+        track, master, {.start = start, .end = end, .linkGroup = link, .withIntrinsics = false});
   }
 
   int KeyframeLeft() const { return view->GetKeyframeView()->GetBounds().left; }
 
   MessagingTestScope scope;
-  ProjectRef project;
+  ProjectBuilder builder{"Panel"};
+  ProjectRef project = builder.GetProject();
   SequenceRef sequence;
   TrackRef v1;
   TrackRef a1;

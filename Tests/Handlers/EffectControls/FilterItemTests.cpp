@@ -17,8 +17,8 @@
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/ComponentParamActions.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
-#include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Toolkit/CheckBoxControl.h"
 #include "Host/Toolkit/KeyModifiers.h"
@@ -40,12 +40,9 @@ constexpr TickTime kSecond = kTicksPerSecond;
 class FilterItemTest : public ::testing::Test {
  protected:
   FilterItemTest() {
-    project->AddSequence(sequence);
-    sequence->AddTrack(track);
-    track->AddItem(clip);
     radius->SetRange(0, 100);
     effect->AddParam(radius);
-    clip->GetComponentChain()->Append(effect);
+    builder.AddComponent(clip->GetComponentChain(), effect);
     host.SetRootView(listView);
     AddListener(kStation, listRecorder);
     AddListener(sequence->GetStation(), sequenceRecorder);
@@ -86,10 +83,12 @@ class FilterItemTest : public ::testing::Test {
   static constexpr int kWidth = 400;
 
   MessagingTestScope messaging;
-  ProjectRef project = Project::Create("Filter rows");
-  SequenceRef sequence = Sequence::Create("Sequence");
-  TrackRef track = Track::Create(MediaType::Video, "V1");
-  TrackItemRef clip = TrackItem::CreateClip(MediaType::Video, 0, 10 * kSecond, nullptr, 0);
+  ProjectBuilder builder{"Filter rows"};
+  ProjectRef project = builder.GetProject();
+  SequenceRef sequence = builder.AddSequence("Sequence");
+  TrackRef track = builder.AddTrack(sequence, MediaType::Video, "V1");
+  TrackItemRef clip =
+      builder.AddClip(track, nullptr, {.start = 0, .end = 10 * kSecond, .withIntrinsics = false});
   ComponentRef effect = Component::Create("XO.Test Blur", "Blur", MediaType::Video, false);
   ComponentParamRef radius = ComponentParam::Create("Radius", ParamType::FloatSlider, 10.0);
   ViewHost host{{kWidth, 300}};

@@ -12,8 +12,8 @@
 #include "Host/Model/ComponentChain.h"
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
-#include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/TransitionData.h"
 #include "Host/Model/UndoStack.h"
@@ -35,10 +35,7 @@ std::string Meant(const std::string& className) {
 class ParameterRowFactoryTest : public ::testing::Test {
  protected:
   ParameterRowFactoryTest() {
-    project->AddSequence(sequence);
-    sequence->AddTrack(track);
-    track->AddItem(clip);
-    clip->GetComponentChain()->Append(video);
+    builder.AddComponent(clip->GetComponentChain(), video);
     host.SetRootView(listView);
   }
   ~ParameterRowFactoryTest() override {
@@ -90,10 +87,12 @@ class ParameterRowFactoryTest : public ::testing::Test {
   using Names = std::vector<std::string>;
 
   MessagingTestScope messaging;
-  ProjectRef project = Project::Create("Factory");
-  SequenceRef sequence = Sequence::Create("Sequence");
-  TrackRef track = Track::Create(MediaType::Video, "V1");
-  TrackItemRef clip = TrackItem::CreateClip(MediaType::Video, 0, 10 * kSecond, nullptr, 0);
+  ProjectBuilder builder{"Factory"};
+  ProjectRef project = builder.GetProject();
+  SequenceRef sequence = builder.AddSequence("Sequence");
+  TrackRef track = builder.AddTrack(sequence, MediaType::Video, "V1");
+  TrackItemRef clip =
+      builder.AddClip(track, nullptr, {.start = 0, .end = 10 * kSecond, .withIntrinsics = false});
   ComponentRef video = Component::Create("XO.Test Blur", "Blur", MediaType::Video, false);
   ComponentRef audio = Component::Create("XO.Test Delay", "Delay", MediaType::Audio, false);
   ComponentRef chromil =

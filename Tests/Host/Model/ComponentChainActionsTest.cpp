@@ -22,13 +22,13 @@ class ComponentChainActionsTest : public ModelTest {
 };
 
 TEST_F(ComponentChainActionsTest, RemovingAFilterIsUndoable) {
-  const std::string before = Dump();
-  ASSERT_EQ(ComponentChainActions::RemoveFilter(videoChain, blur), EditStatus::Done);
-  EXPECT_EQ(Names(*videoChain), "Motion Opacity TimeRemapping Crop");
-  EXPECT_EQ(blur->GetChain(), nullptr);
-  EXPECT_EQ(Undo().GetUndoName(), "MZ.ComponentChainActions.RemoveFilter");
-  Undo().Undo();
-  EXPECT_EQ(Dump(), before);
+  CheckUndoRoundTrip({.name = "MZ.ComponentChainActions.RemoveFilter",
+                      .edit = [&] { return ComponentChainActions::RemoveFilter(videoChain, blur); },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(Names(*videoChain), "Motion Opacity TimeRemapping Crop");
+                            EXPECT_EQ(blur->GetChain(), nullptr);
+                          }});
   EXPECT_EQ(blur->GetChain(), videoChain.get());
 }
 
@@ -84,19 +84,20 @@ TEST_F(ComponentChainActionsTest, AnInsertionComponentOutsideTheChainIsRefusedVi
 
 TEST_F(ComponentChainActionsTest, MovingBetweenChainsIsOneStepBothWays) {
   const ComponentChainRef otherChain = second->GetComponentChain();
-  const std::string before = Dump();
-  ASSERT_EQ(ComponentChainActions::MoveFilters(otherChain, {blur}, otherChain->GetAt(0)),
-            EditStatus::Done);
-  EXPECT_EQ(Names(*otherChain), "Motion GaussianBlur Opacity TimeRemapping");
-  EXPECT_EQ(Names(*videoChain), "Motion Opacity TimeRemapping Crop");
-  EXPECT_EQ(blur->GetChain(), otherChain.get());
-  EXPECT_EQ(blur->GetTrackItem(), second.get());
-  const std::string after = Dump();
-  Undo().Undo();
-  EXPECT_EQ(Dump(), before);
+  CheckUndoRoundTrip(
+      {.name = ComponentChainActions::kMoveFilters,
+       .edit =
+           [&] {
+             return ComponentChainActions::MoveFilters(otherChain, {blur}, otherChain->GetAt(0));
+           },
+       .checkEdited =
+           [&] {
+             EXPECT_EQ(Names(*otherChain), "Motion GaussianBlur Opacity TimeRemapping");
+             EXPECT_EQ(Names(*videoChain), "Motion Opacity TimeRemapping Crop");
+             EXPECT_EQ(blur->GetChain(), otherChain.get());
+             EXPECT_EQ(blur->GetTrackItem(), second.get());
+           }});
   EXPECT_EQ(blur->GetChain(), videoChain.get());
-  Undo().Redo();
-  EXPECT_EQ(Dump(), after);
 }
 
 TEST_F(ComponentChainActionsTest, AudioEffectsDoNotMoveIntoAVideoChain) {

@@ -38,10 +38,13 @@ TEST_F(ComponentParamActionsTest, StopwatchUndoRestoresEveryKeyframe) {
   ComponentParamActions::AddKeyframe(opacity, 4 * kSecond, 90.0);
   ComponentParamActions::SetTemporalInterpolation(opacity, 4 * kSecond,
                                                   TemporalInterpolation::Hold);
-  const std::string before = DescribeForTest(*opacity);
-  ComponentParamActions::SetTimeVarying(opacity, false, 0);
-  Undo().Undo();
-  EXPECT_EQ(DescribeForTest(*opacity), before);
+  MessageRecorder recorder;
+  recorder.Listen(opacity->GetStation());
+  UndoRoundTrip(
+      *project, [&] { return DescribeForTest(*opacity); }, recorder)
+      .Check({.name = "MZ.ComponentParam.SetTimeVarying",
+              .edit = [&] { return ComponentParamActions::SetTimeVarying(opacity, false, 0); },
+              .messages = {"ParamChangedMessage"}});
 }
 
 TEST_F(ComponentParamActionsTest, TurningAnAlreadyRunningStopwatchOnChangesNothing) {

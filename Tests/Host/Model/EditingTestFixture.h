@@ -2,15 +2,9 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <string>
-#include <string_view>
-#include <vector>
 
-#include "Host/Messaging/Listener.h"
-#include "Host/Messaging/Message.h"
 #include "Host/Messaging/MessagingTestScope.h"
-#include "Host/Messaging/Station.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentChain.h"
 #include "Host/Model/ComponentParam.h"
@@ -19,34 +13,12 @@
 #include "Host/Model/Media.h"
 #include "Host/Model/ModelDescription.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
-
-// Records the type name of every message on the stations it listens on, in order.
-class EditingMessageLog : public Listener {
- public:
-  void Listen(const StationName& station) { AddListener(station, *this); }
-  void ListenToMessage(const Message& message) override {
-    entries.emplace_back(message.GetTypeName());
-  }
-  int Count(std::string_view typeName) const {
-    int count = 0;
-    for (const std::string& entry : entries) {
-      count += entry == typeName ? 1 : 0;
-    }
-    return count;
-  }
-  // The messages as a sorted multiset, for comparing an edit's messages with its undo's.
-  std::vector<std::string> Sorted() const {
-    std::vector<std::string> sorted = entries;
-    std::sort(sorted.begin(), sorted.end());
-    return sorted;
-  }
-  void Clear() { entries.clear(); }
-
-  std::vector<std::string> entries;
-};
+#include "Tests/Host/Model/MessageRecorder.h"
+#include "Tests/Host/Model/UndoRoundTrip.h"
 
 inline constexpr TickTime kSec = kTicksPerSecond;
 inline constexpr TickTime kFrame25 = kTicksPerSecond / 25;
@@ -59,62 +31,56 @@ inline constexpr TickTime kFrame25 = kTicksPerSecond / 25;
 class EditingModelTest : public ::testing::Test {
  protected:
   EditingModelTest() {
-    project = Project::Create("Editing");
-    sequence = Sequence::Create("Sequence", kFrameRate_25);
-    project->AddSequence(sequence);
-    project->SetActiveSequence(sequence);
-    v1 = Track::Create(MediaType::Video, "V1");
-    a1 = Track::Create(MediaType::Audio, "A1");
-    sequence->AddTrack(v1);
-    sequence->AddTrack(a1);
-    mediaA = Media::Create("a.mov", 20 * kSec, true, true);
-    mediaB = Media::Create("b.mov", 30 * kSec, true, true);
-    clipA = MasterClip::Create("A", mediaA);
-    clipB = MasterClip::Create("B", mediaB);
-    project->AddMasterClip(clipA);
-    project->AddMasterClip(clipB);
+    sequence = builder.AddSequence("Sequence", kFrameRate_25);
+    v1 = builder.AddTrack(sequence, MediaType::Video, "V1");
+    a1 = builder.AddTrack(sequence, MediaType::Audio, "A1");
+    mediaA = builder.AddMedia("a.mov", 20 * kSec, ProjectBuilder::Streams::VideoAndAudio);
+    mediaB = builder.AddMedia("b.mov", 30 * kSec, ProjectBuilder::Streams::VideoAndAudio);
+    clipA = builder.AddMasterClip("A", mediaA);
+    clipB = builder.AddMasterClip("B", mediaB);
 
-    a = AddClip(v1, clipA, 0, 5 * kSec, 2 * kSec, 1);
-    b = AddClip(v1, clipB, 5 * kSec, 10 * kSec, 3 * kSec, 2);
-    c = AddClip(v1, clipB, 12 * kSec, 14 * kSec, 10 * kSec, 3);
-    aAudio = AddClip(a1, clipA, 0, 5 * kSec, 2 * kSec, 1);
-    bAudio = AddClip(a1, clipB, 5 * kSec, 10 * kSec, 3 * kSec, 2);
-    cAudio = AddClip(a1, clipB, 12 * kSec, 14 * kSec, 10 * kSec, 3);
+    const ProjectBuilder::ClipSpec spanA{
+        .start = 0, .end = 5 * kSec, .mediaIn = 2 * kSec, .linkGroup = 1};
+    const ProjectBuilder::ClipSpec spanB{
+        .start = 5 * kSec, .end = 10 * kSec, .mediaIn = 3 * kSec, .linkGroup = 2};
+    const ProjectBuilder::ClipSpec spanC{
+        .start = 12 * kSec, .end = 14 * kSec, .mediaIn = 10 * kSec, .linkGroup = 3};
+    a = builder.AddClip(v1, clipA, spanA);
+    b = builder.AddClip(v1, clipB, spanB);
+    c = builder.AddClip(v1, clipB, spanC);
+    aAudio = builder.AddClip(a1, clipA, spanA);
+    bAudio = builder.AddClip(a1, clipB, spanB);
+    cAudio = builder.AddClip(a1, clipB, spanC);
 
     TransitionData dissolve;
     dissolve.matchName = "XO.KRVN CrossDissolve";
     dissolve.displayName = "Cross Dissolve";
     dissolve.allowedDirections = 0xFF;
-    transition = TrackItem::CreateTransition(MediaType::Video, 4500 * kSec / 1000,
-                                             5500 * kSec / 1000, dissolve);
-    v1->AddItem(transition);
+    transition = builder.AddTransition(v1, 4500 * kSec / 1000, 5500 * kSec / 1000, dissolve);
 
-    blur = EffectCatalogue::Standard().Create(kMatchName_GaussianBlur);
-    crop = EffectCatalogue::Standard().Create(kMatchName_Crop);
-    a->GetComponentChain()->Append(blur);
-    a->GetComponentChain()->Append(crop);
-  }
-
-  TrackItemRef AddClip(const TrackRef& track, const MasterClipRef& clip, TickTime start,
-                       TickTime end, TickTime mediaIn, int link) {
-    TrackItemRef item = TrackItem::CreateClip(track->GetMediaType(), start, end, clip, mediaIn);
-    for (const ComponentRef& intrinsic :
-         EffectCatalogue::Standard().CreateIntrinsics(track->GetMediaType())) {
-      item->GetComponentChain()->Append(intrinsic);
-    }
-    track->AddItem(item);
-    item->SetLinkGroup(link);
-    return item;
+    blur = builder.AddEffect(a, kMatchName_GaussianBlur);
+    crop = builder.AddEffect(a, kMatchName_Crop);
   }
 
   std::string State() const { return DescribeForTest(*project); }
 
-  // Listens to the sequence and every item of the fixture.
-  void ListenToEverything(EditingMessageLog& log) const {
-    log.Listen(sequence->GetStation());
+  // Listens to the sequence, every item of the fixture and their chains.
+  void ListenToEverything(MessageRecorder& recorder) const {
+    recorder.Listen(sequence->GetStation());
     for (const TrackItemRef& item : {a, b, c, aAudio, bAudio, cAudio, transition}) {
-      log.Listen(item->GetStation());
+      recorder.Listen(item->GetStation());
+      recorder.Listen(item->GetComponentChain()->GetStation());
     }
+  }
+
+  // Checks an edit, its undo and its redo against the whole project, hearing what
+  // ListenToEverything hears.
+  void CheckUndoRoundTrip(const UndoRoundTrip::Step& step) {
+    MessageRecorder recorder;
+    ListenToEverything(recorder);
+    UndoRoundTrip(
+        *project, [this] { return State(); }, recorder)
+        .Check(step);
   }
 
   // "[start,end)" of an item in whole frames of 25 fps, for short expectations.
@@ -124,7 +90,8 @@ class EditingModelTest : public ::testing::Test {
   }
 
   MessagingTestScope messaging;
-  ProjectRef project;
+  ProjectBuilder builder{"Editing"};  // for items a test adds
+  ProjectRef project = builder.GetProject();
   SequenceRef sequence;
   TrackRef v1;
   TrackRef a1;

@@ -57,21 +57,21 @@ TEST_F(FilterSelectionTest, PastedEffectIsACloneWithTheSameValuesAfterTheSelecte
   const std::vector<ComponentChainRef> targets{b->GetComponentChain(), bAudio->GetComponentChain()};
   const auto& item = *project->GetClipboard().GetItem();
   ASSERT_TRUE(onB.QueryPaste(&item, targets));
-  const std::string before = State();
-  ASSERT_EQ(onB.Paste(item, targets), EditStatus::Done);
-
   const ComponentChainRef& chain = b->GetComponentChain();
-  EXPECT_EQ(MatchNames(chain),
-            (std::vector<std::string>{kMatchName_Motion, kMatchName_Opacity,
-                                      kMatchName_GaussianBlur, kMatchName_TimeRemapping}));
-  const ComponentRef pasted = chain->GetAt(2);
-  EXPECT_NE(pasted, blur);
-  EXPECT_EQ(pasted->FindParam("Blurriness")->GetValueAt(3 * kSec), ParamValue(7.0));
-  EXPECT_TRUE(pasted->FindParam("Blurriness")->IsTimeVarying());
-  EXPECT_EQ(project->GetUndoStack().GetUndoName(), kPasteFiltersActionName);
-
-  ASSERT_TRUE(project->GetUndoStack().Undo());
-  EXPECT_EQ(State(), before);
+  ComponentRef pasted;
+  CheckUndoRoundTrip(
+      {.name = kPasteFiltersActionName,
+       .edit = [&] { return onB.Paste(item, targets); },
+       .checkEdited =
+           [&] {
+             EXPECT_EQ(MatchNames(chain), (std::vector<std::string>{
+                                              kMatchName_Motion, kMatchName_Opacity,
+                                              kMatchName_GaussianBlur, kMatchName_TimeRemapping}));
+             pasted = chain->GetAt(2);
+             EXPECT_NE(pasted, blur);
+             EXPECT_EQ(pasted->FindParam("Blurriness")->GetValueAt(3 * kSec), ParamValue(7.0));
+             EXPECT_TRUE(pasted->FindParam("Blurriness")->IsTimeVarying());
+           }});
   EXPECT_EQ(chain->GetIndexOf(pasted.get()), -1);
 }
 
@@ -127,20 +127,21 @@ TEST_F(FilterSelectionTest, TwoMasksPasteAsOneStepWithTheirUndoText) {
   auto item = selection.CreateClipboardItem();
   ASSERT_TRUE(item->HasMasks());
   EXPECT_TRUE(item->GetEffects().empty());
-  const std::string before = State();
-  const std::size_t steps = project->GetUndoStack().GetUndoNames().size();
-  ASSERT_EQ(FilterMultiSelection::PasteMasks(target, *item,
-                                             "$$$/Vantile/MZ/PasteMasks=Paste Effect Masks"),
-            EditStatus::Done);
-  ASSERT_EQ(target->GetMasks().size(), 2u);
-  EXPECT_EQ(target->GetMasks()[0]->GetMaskOwner(), target.get());
-  EXPECT_NE(target->GetMasks()[0], mask1);
-  EXPECT_EQ(blur->GetMasks().size(), 2u);
-  EXPECT_EQ(project->GetUndoStack().GetUndoNames().size(), steps + 1);
-  EXPECT_EQ(project->GetUndoStack().GetUndoName(), kPasteMasksActionName);
-  EXPECT_EQ(project->GetUndoStack().GetUndoNames().back(), kPasteMasksActionName);
-  ASSERT_TRUE(project->GetUndoStack().Undo());
-  EXPECT_EQ(State(), before);
+  CheckUndoRoundTrip({.name = kPasteMasksActionName,
+                      .edit =
+                          [&] {
+                            return FilterMultiSelection::PasteMasks(
+                                target, *item, "$$$/Vantile/MZ/PasteMasks=Paste Effect Masks");
+                          },
+                      .checkEdited =
+                          [&] {
+                            ASSERT_EQ(target->GetMasks().size(), 2u);
+                            EXPECT_EQ(target->GetMasks()[0]->GetMaskOwner(), target.get());
+                            EXPECT_NE(target->GetMasks()[0], mask1);
+                            EXPECT_EQ(blur->GetMasks().size(), 2u);
+                            EXPECT_EQ(project->GetUndoStack().GetUndoNames().back(),
+                                      kPasteMasksActionName);
+                          }});
 
   const ComponentRef motion = a->GetComponentChain()->FindByMatchName(kMatchName_Motion);
   EXPECT_EQ(FilterMultiSelection::PasteMasks(motion, *item), EditStatus::InvalidArgument);

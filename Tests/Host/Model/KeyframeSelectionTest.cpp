@@ -133,23 +133,24 @@ TEST_F(KeyframeSelectionTest, TemporalInterpolationIsOneUndoStepOverAllParameter
   Select(blurriness, 6 * kSec);
   Select(position, 3 * kSec);
   Select(dimensions, 3 * kSec);
-  const std::string before = State();
-  const std::size_t steps = project->GetUndoStack().GetUndoNames().size();
-
-  ASSERT_EQ(selection->SetKeyframeTemporalInterpolation(2), EditStatus::Done);
-  EXPECT_TRUE(selection->TemporalInterpolationModeMatches(2) == false);  // the menu stays
-  const KeyframeCurve& curve = blurriness->GetKeyframes();
-  EXPECT_EQ(curve.At(*curve.FindAt(3 * kSec)).interpolation, TemporalInterpolation::Bezier);
-  EXPECT_EQ(curve.At(*curve.FindAt(6 * kSec)).interpolation, TemporalInterpolation::Bezier);
-  EXPECT_EQ(curve.At(*curve.FindAt(4 * kSec)).interpolation, TemporalInterpolation::Linear);
-  EXPECT_EQ(position->GetKeyframes().At(0).interpolation, TemporalInterpolation::Bezier);
-  EXPECT_NE(dimensions->GetKeyframes().At(0).interpolation, TemporalInterpolation::Bezier);
-
-  UndoStack& undo = project->GetUndoStack();
-  EXPECT_EQ(undo.GetUndoNames().size(), steps + 1);
-  EXPECT_EQ(undo.GetUndoName(), kKeyframeActionSetTemporalInterpolation);
-  ASSERT_TRUE(undo.Undo());
-  EXPECT_EQ(State(), before);
+  CheckUndoRoundTrip({.name = kKeyframeActionSetTemporalInterpolation,
+                      .edit = [&] { return selection->SetKeyframeTemporalInterpolation(2); },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_TRUE(selection->TemporalInterpolationModeMatches(2) ==
+                                        false);  // the menu stays
+                            const KeyframeCurve& curve = blurriness->GetKeyframes();
+                            EXPECT_EQ(curve.At(*curve.FindAt(3 * kSec)).interpolation,
+                                      TemporalInterpolation::Bezier);
+                            EXPECT_EQ(curve.At(*curve.FindAt(6 * kSec)).interpolation,
+                                      TemporalInterpolation::Bezier);
+                            EXPECT_EQ(curve.At(*curve.FindAt(4 * kSec)).interpolation,
+                                      TemporalInterpolation::Linear);
+                            EXPECT_EQ(position->GetKeyframes().At(0).interpolation,
+                                      TemporalInterpolation::Bezier);
+                            EXPECT_NE(dimensions->GetKeyframes().At(0).interpolation,
+                                      TemporalInterpolation::Bezier);
+                          }});
 }
 
 TEST_F(KeyframeSelectionTest, SettingTheModeItAlreadyHasMakesNoUndoStep) {
@@ -181,14 +182,14 @@ TEST_F(KeyframeSelectionTest, SpatialInterpolationChangesOnlyPointKeyframes) {
 
 TEST_F(KeyframeSelectionTest, EaseInFlattensTheIncomingSideAndUndoRestores) {
   Select(blurriness, 4 * kSec);
-  const std::string before = State();
-  ASSERT_EQ(selection->ApplyAutomaticEase(0), EditStatus::Done);
-  const Keyframe& eased = blurriness->GetKeyframes().At(2);
-  EXPECT_EQ(eased.inSpeed, 0.0);
-  EXPECT_EQ(eased.interpolation, TemporalInterpolation::Bezier);
-  EXPECT_EQ(project->GetUndoStack().GetUndoNames().back(), kKeyframeActionApplyAutomaticEase);
-  ASSERT_TRUE(project->GetUndoStack().Undo());
-  EXPECT_EQ(State(), before);
+  CheckUndoRoundTrip({.name = kKeyframeActionApplyAutomaticEase,
+                      .edit = [&] { return selection->ApplyAutomaticEase(0); },
+                      .checkEdited =
+                          [&] {
+                            const Keyframe& eased = blurriness->GetKeyframes().At(2);
+                            EXPECT_EQ(eased.inSpeed, 0.0);
+                            EXPECT_EQ(eased.interpolation, TemporalInterpolation::Bezier);
+                          }});
 }
 
 TEST_F(KeyframeSelectionTest, RemovingEveryKeyframeKeepsTheFirstValueAsConstant) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -21,6 +22,12 @@ class MessageRecorder : public Listener {
       count += name == typeName ? 1 : 0;
     }
     return count;
+  }
+  // The names as a sorted multiset, for comparing an edit's messages with its undo's.
+  std::vector<std::string> Sorted() const {
+    std::vector<std::string> sorted = names;
+    std::sort(sorted.begin(), sorted.end());
+    return sorted;
   }
   void Clear() { names.clear(); }
 

@@ -17,10 +17,12 @@
 #include "Host/Model/Media.h"
 #include "Host/Model/ModelDescription.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Tests/Host/Model/MessageRecorder.h"
+#include "Tests/Host/Model/UndoRoundTrip.h"
 
 inline constexpr TickTime kSecond = kTicksPerSecond;
 
@@ -31,56 +33,37 @@ inline constexpr TickTime kSecond = kTicksPerSecond;
 class ModelTest : public ::testing::Test {
  protected:
   ModelTest() {
-    project = Project::Create("Test");
-    sequence = Sequence::Create("Sequence 01", kFrameRate_25);
-    project->AddSequence(sequence);
-    project->SetActiveSequence(sequence);
-    v1 = Track::Create(MediaType::Video, "V1");
-    a1 = Track::Create(MediaType::Audio, "A1");
-    a2 = Track::Create(MediaType::Audio, "A2");
-    sequence->AddTrack(v1);
-    sequence->AddTrack(a1);
-    sequence->AddTrack(a2);
+    ProjectBuilder builder("Test");
+    project = builder.GetProject();
+    sequence = builder.AddSequence("Sequence 01", kFrameRate_25);
+    v1 = builder.AddTrack(sequence, MediaType::Video, "V1");
+    a1 = builder.AddTrack(sequence, MediaType::Audio, "A1");
+    a2 = builder.AddTrack(sequence, MediaType::Audio, "A2");
+    media = builder.AddMedia("interview.mov", 60 * kSecond, ProjectBuilder::Streams::VideoAndAudio);
+    masterClip = builder.AddMasterClip("Interview", media);
 
-    media = Media::Create("interview.mov", 60 * kSecond, true, true);
-    masterClip = MasterClip::Create("Interview", media);
-    project->AddMasterClip(masterClip);
-
-    video = AddClip(v1, MediaType::Video, 2 * kSecond, 7 * kSecond, 1 * kSecond);
-    audio1 = AddClip(a1, MediaType::Audio, 2 * kSecond, 7 * kSecond, 1 * kSecond);
-    audio2 = AddClip(a2, MediaType::Audio, 2 * kSecond, 7 * kSecond, 1 * kSecond);
+    const ProjectBuilder::ClipSpec interview{
+        .start = 2 * kSecond, .end = 7 * kSecond, .mediaIn = kSecond, .linkGroup = 1};
+    video = builder.AddClip(v1, masterClip, interview);
+    audio1 = builder.AddClip(a1, masterClip, interview);
+    audio2 = builder.AddClip(a2, masterClip, interview);
     audio1->SetPartOrderKey(1);
     audio2->SetPartOrderKey(0);
-    for (const TrackItemRef& item : {video, audio1, audio2}) {
-      item->SetLinkGroup(1);
-    }
     videoChain = video->GetComponentChain();
-    blur = Catalogue().Create(kMatchName_GaussianBlur);
-    crop = Catalogue().Create(kMatchName_Crop);
-    videoChain->Append(blur);
-    videoChain->Append(crop);
-    audio1->GetComponentChain()->Append(Catalogue().Create(kMatchName_Delay));
+    blur = builder.AddEffect(video, kMatchName_GaussianBlur);
+    crop = builder.AddEffect(video, kMatchName_Crop);
+    builder.AddEffect(audio1, kMatchName_Delay);
 
-    second = AddClip(v1, MediaType::Video, 7 * kSecond, 12 * kSecond, 10 * kSecond);
+    second = builder.AddClip(v1, masterClip,
+                             {.start = 7 * kSecond, .end = 12 * kSecond, .mediaIn = 10 * kSecond});
     TransitionData data;
     data.matchName = "XO.KRVN CrossDissolve";
     data.displayName = "Cross Dissolve";
-    transition = TrackItem::CreateTransition(MediaType::Video, 6 * kSecond + kSecond / 2,
-                                             7 * kSecond + kSecond / 2, data);
-    v1->AddItem(transition);
+    transition =
+        builder.AddTransition(v1, 6 * kSecond + kSecond / 2, 7 * kSecond + kSecond / 2, data);
   }
 
   static const EffectCatalogue& Catalogue() { return EffectCatalogue::Standard(); }
-
-  TrackItemRef AddClip(const TrackRef& track, MediaType type, TickTime start, TickTime end,
-                       TickTime mediaIn) {
-    TrackItemRef item = TrackItem::CreateClip(type, start, end, masterClip, mediaIn);
-    for (const ComponentRef& intrinsic : Catalogue().CreateIntrinsics(type)) {
-      item->GetComponentChain()->Append(intrinsic);
-    }
-    track->AddItem(item);
-    return item;
-  }
 
   ComponentRef Intrinsic(const char* matchName) const {
     return videoChain->FindByMatchName(matchName);
@@ -89,6 +72,24 @@ class ModelTest : public ::testing::Test {
     return component->FindParam(name);
   }
   std::string Dump() const { return DescribeForTest(*project); }
+
+  // Checks an edit, its undo and its redo against the whole project; `recorder` hears what the
+  // test listens to.
+  void CheckUndoRoundTrip(const UndoRoundTrip::Step& step, MessageRecorder& recorder) {
+    UndoRoundTrip(
+        *project, [this] { return Dump(); }, recorder)
+        .Check(step);
+  }
+  // The same, hearing the sequence, every item and their chains.
+  void CheckUndoRoundTrip(const UndoRoundTrip::Step& step) {
+    MessageRecorder recorder;
+    recorder.Listen(sequence->GetStation());
+    for (const TrackItemRef& item : {video, audio1, audio2, second, transition}) {
+      recorder.Listen(item->GetStation());
+      recorder.Listen(item->GetComponentChain()->GetStation());
+    }
+    CheckUndoRoundTrip(step, recorder);
+  }
   UndoStack& Undo() { return project->GetUndoStack(); }
 
   MessagingTestScope messaging;

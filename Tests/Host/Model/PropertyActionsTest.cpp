@@ -19,29 +19,41 @@ TEST_F(PropertyActionsTest, FrameAlignmentIsUndoableAndAnnouncedAsAProperty) {
     }
   });
   AddListener(sequence->GetStation(), listener);
-  ASSERT_EQ(SequenceSettingsActions::SetAudioFrameAligned(sequence, true), EditStatus::Done);
-  EXPECT_TRUE(sequence->IsAudioFrameAligned());
-  EXPECT_EQ(SequenceSettingsActions::SetAudioFrameAligned(sequence, true), EditStatus::NoChange);
-  Undo().Undo();
+  MessageRecorder recorder;
+  recorder.Listen(sequence->GetStation());
+  CheckUndoRoundTrip(
+      {.name = SequenceSettingsActions::kSetFrameAlignment,
+       .edit = [&] { return SequenceSettingsActions::SetAudioFrameAligned(sequence, true); },
+       .checkEdited =
+           [&] {
+             EXPECT_TRUE(sequence->IsAudioFrameAligned());
+             EXPECT_EQ(SequenceSettingsActions::SetAudioFrameAligned(sequence, true),
+                       EditStatus::NoChange);
+           },
+       .messages = {"PropertiesChangedMessage"}},
+      recorder);
   EXPECT_FALSE(sequence->IsAudioFrameAligned());
-  EXPECT_EQ(keys, (std::vector<std::string>{"MZ.FrameAlignment", "MZ.FrameAlignment"}));
+  // Do, undo, redo and the closing undo.
+  EXPECT_EQ(keys, std::vector<std::string>(4, "MZ.FrameAlignment"));
 }
 
 TEST_F(PropertyActionsTest, TheZeroPointIsUndoable) {
   MessageRecorder recorder;
   recorder.Listen(sequence->GetStation());
-  ASSERT_EQ(SequenceSettingsActions::SetZeroPoint(sequence, 3600 * kSecond), EditStatus::Done);
-  Undo().Undo();
+  CheckUndoRoundTrip(
+      {.name = SequenceSettingsActions::kSetZeroPoint,
+       .edit = [&] { return SequenceSettingsActions::SetZeroPoint(sequence, 3600 * kSecond); },
+       .messages = {"SequenceZeroPointChangedMessage"}},
+      recorder);
   EXPECT_EQ(sequence->GetZeroPoint(), 0);
-  EXPECT_EQ(recorder.Count("SequenceZeroPointChangedMessage"), 2);
   EXPECT_EQ(SequenceSettingsActions::SetZeroPoint(sequence, kTime_Max),
             EditStatus::InvalidArgument);
 }
 
 TEST_F(PropertyActionsTest, RenamingAnItemAndUndoingShowsTheMasterClipNameAgain) {
-  ASSERT_EQ(TrackItemActions::SetName(video, "Close-up"), EditStatus::Done);
-  EXPECT_EQ(video->GetName(), "Close-up");
-  Undo().Undo();
+  CheckUndoRoundTrip({.name = TrackItemActions::kSetName,
+                      .edit = [&] { return TrackItemActions::SetName(video, "Close-up"); },
+                      .checkEdited = [&] { EXPECT_EQ(video->GetName(), "Close-up"); }});
   masterClip->SetName("Interview 2");
   EXPECT_EQ(video->GetName(), "Interview 2");
 }
@@ -50,11 +62,16 @@ TEST_F(PropertyActionsTest, TheLabelColourIsUndoableAndSendsATrackItemChange) {
   MessageRecorder recorder;
   recorder.Listen(video->GetStation());
   const std::uint32_t before = video->GetLabelColor();
-  ASSERT_EQ(TrackItemActions::SetLabelColor(video, 0xFF0000), EditStatus::Done);
-  EXPECT_EQ(TrackItemActions::SetLabelColor(video, 0xFF0000), EditStatus::NoChange);
-  Undo().Undo();
+  CheckUndoRoundTrip({.name = TrackItemActions::kSetLabelColor,
+                      .edit = [&] { return TrackItemActions::SetLabelColor(video, 0xFF0000); },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(TrackItemActions::SetLabelColor(video, 0xFF0000),
+                                      EditStatus::NoChange);
+                          },
+                      .messages = {"TrackItemChangedMessage"}},
+                     recorder);
   EXPECT_EQ(video->GetLabelColor(), before);
-  EXPECT_EQ(recorder.Count("TrackItemChangedMessage"), 2);
 }
 
 TEST_F(PropertyActionsTest, ARefusedEditOnAReadOnlyProjectChangesNothing) {

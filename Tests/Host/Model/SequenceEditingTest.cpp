@@ -11,30 +11,6 @@ using Edge = SequenceEditing::Edge;
 
 class SequenceEditingTest : public EditingModelTest {
  protected:
-  // Runs `edit`, expects it Done, one undo step named `name`, then undoes it and expects the exact
-  // original state and the same change messages as the edit.
-  template <class Edit, class Check>
-  void DoCheckUndo(const char* name, Edit edit, Check check) {
-    const std::string before = State();
-    const std::size_t steps = project->GetUndoStack().GetUndoNames().size();
-    EditingMessageLog log;
-    ListenToEverything(log);
-    ASSERT_EQ(edit(), EditStatus::Done);
-    check();
-    EXPECT_EQ(project->GetUndoStack().GetUndoNames().size(), steps + 1);
-    EXPECT_EQ(project->GetUndoStack().GetUndoName(), name);
-    const std::vector<std::string> editMessages = log.Sorted();
-    EXPECT_FALSE(editMessages.empty());
-    const std::string after = State();
-    log.Clear();
-    ASSERT_TRUE(project->GetUndoStack().Undo());
-    EXPECT_EQ(State(), before);
-    EXPECT_EQ(log.Sorted(), editMessages);
-    ASSERT_TRUE(project->GetUndoStack().Redo());
-    EXPECT_EQ(State(), after);
-    ASSERT_TRUE(project->GetUndoStack().Undo());
-  }
-
   // Frames of 25 fps.
   static constexpr TickTime F(double frames) { return static_cast<TickTime>(frames * kFrame25); }
 };
@@ -57,16 +33,17 @@ TEST_F(SequenceEditingTest, TransitionStartStopsAtTheHeadMaterialOfClipBAndAtThe
             500 * kSec / 1000);
   EXPECT_EQ(SequenceActions::TrimTransitions(transition, Edge::Start, -3 * kSec),
             EditStatus::TimeOutOfRange);
-  DoCheckUndo(
-      SequenceActions::kTrimTransitions,
-      [&] { return SequenceActions::TrimTransitions(transition, Edge::Start, -kSec); },
-      [&] {
-        EXPECT_EQ(transition->GetStart(), 3500 * kSec / 1000);
-        EXPECT_EQ(transition->GetEnd(), 5500 * kSec / 1000);
-        EXPECT_DOUBLE_EQ(transition->GetTransitionData().cutRatio, 0.75);
-        EXPECT_EQ(Span(a), "[0,125)");
-        EXPECT_EQ(Span(b), "[125,250)");
-      });
+  CheckUndoRoundTrip(
+      {.name = SequenceActions::kTrimTransitions,
+       .edit = [&] { return SequenceActions::TrimTransitions(transition, Edge::Start, -kSec); },
+       .checkEdited =
+           [&] {
+             EXPECT_EQ(transition->GetStart(), 3500 * kSec / 1000);
+             EXPECT_EQ(transition->GetEnd(), 5500 * kSec / 1000);
+             EXPECT_DOUBLE_EQ(transition->GetTransitionData().cutRatio, 0.75);
+             EXPECT_EQ(Span(a), "[0,125)");
+             EXPECT_EQ(Span(b), "[125,250)");
+           }});
 }
 
 TEST_F(SequenceEditingTest, TransitionEndStopsAtClipBsEndAndAtTheCut) {
@@ -74,14 +51,18 @@ TEST_F(SequenceEditingTest, TransitionEndStopsAtClipBsEndAndAtTheCut) {
             4500 * kSec / 1000);
   EXPECT_EQ(SequenceActions::QueryTrimTransition(transition, Edge::End, -20 * kSec),
             -500 * kSec / 1000);
-  DoCheckUndo(
-      SequenceActions::kTrimTransitions,
-      [&] { return SequenceActions::TrimTransitions(transition, Edge::End, -500 * kSec / 1000); },
-      [&] {
-        EXPECT_EQ(transition->GetEnd(), 5 * kSec);
-        EXPECT_EQ(TransitionActions::GetAlignment(*transition),
-                  TransitionActions::Alignment::EndAtCut);
-      });
+  CheckUndoRoundTrip({.name = SequenceActions::kTrimTransitions,
+                      .edit =
+                          [&] {
+                            return SequenceActions::TrimTransitions(transition, Edge::End,
+                                                                    -500 * kSec / 1000);
+                          },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(transition->GetEnd(), 5 * kSec);
+                            EXPECT_EQ(TransitionActions::GetAlignment(*transition),
+                                      TransitionActions::Alignment::EndAtCut);
+                          }});
 }
 
 TEST_F(SequenceEditingTest, QueriesRoundDraggedDeltasToFrames) {
@@ -92,25 +73,23 @@ TEST_F(SequenceEditingTest, QueriesRoundDraggedDeltasToFrames) {
 TEST_F(SequenceEditingTest, SlideKeepsTheCutInsideTheTransition) {
   EXPECT_EQ(SequenceActions::QuerySlideTransition(transition, 10 * kSec), 500 * kSec / 1000);
   EXPECT_EQ(SequenceActions::QuerySlideTransition(transition, -10 * kSec), -500 * kSec / 1000);
-  DoCheckUndo(
-      SequenceActions::kSlideTransition,
-      [&] { return SequenceActions::SlideTransition(transition, 500 * kSec / 1000); },
-      [&] {
-        EXPECT_EQ(transition->GetStart(), 5 * kSec);
-        EXPECT_EQ(transition->GetDuration(), kSec);
-        EXPECT_EQ(TransitionActions::GetAlignment(*transition),
-                  TransitionActions::Alignment::StartAtCut);
-      });
+  CheckUndoRoundTrip(
+      {.name = SequenceActions::kSlideTransition,
+       .edit = [&] { return SequenceActions::SlideTransition(transition, 500 * kSec / 1000); },
+       .checkEdited =
+           [&] {
+             EXPECT_EQ(transition->GetStart(), 5 * kSec);
+             EXPECT_EQ(transition->GetDuration(), kSec);
+             EXPECT_EQ(TransitionActions::GetAlignment(*transition),
+                       TransitionActions::Alignment::StartAtCut);
+           }});
 }
 
 TEST_F(SequenceEditingTest, SlideNeedsBothClips) {
   // A transition at the start of clip C has no clip A.
-  TrackItemRef opening = TrackItem::CreateTransition(MediaType::Video, 12 * kSec, 13 * kSec,
-                                                     transition->GetTransitionData());
-  TransitionData data = opening->GetTransitionData();
+  TransitionData data = transition->GetTransitionData();
   data.cutRatio = 0.0;
-  opening->SetTransitionData(data);
-  v1->AddItem(opening);
+  const TrackItemRef opening = builder.AddTransition(v1, 12 * kSec, 13 * kSec, data);
   EXPECT_EQ(SequenceEditing::FindTransitionClips(*opening).clipB, c);
   EXPECT_EQ(SequenceEditing::FindTransitionClips(*opening).clipA, nullptr);
   EXPECT_EQ(SequenceActions::QuerySlideTransition(opening, kSec), 0);
@@ -124,16 +103,17 @@ TEST_F(SequenceEditingTest, RollMovesTheCutAndTheTransitionWithinBothClipsMedia)
   EXPECT_EQ(SequenceActions::QueryRollItems(a, b, -10 * kSec), -2500 * kSec / 1000);
   // Right: the transition may not pass B's end.
   EXPECT_EQ(SequenceActions::QueryRollItems(a, b, 10 * kSec), 4500 * kSec / 1000);
-  DoCheckUndo(
-      SequenceActions::kRollItems, [&] { return SequenceActions::RollItems(a, b, kSec); },
-      [&] {
-        EXPECT_EQ(Span(a), "[0,150)");
-        EXPECT_EQ(Span(b), "[150,250)");
-        EXPECT_EQ(b->GetMediaIn(), 4 * kSec);
-        EXPECT_EQ(transition->GetStart(), 5500 * kSec / 1000);
-        EXPECT_EQ(Span(c), "[300,350)");
-        EXPECT_EQ(Span(aAudio), "[0,125)");  // a roll moves only the two clips
-      });
+  CheckUndoRoundTrip({.name = SequenceActions::kRollItems,
+                      .edit = [&] { return SequenceActions::RollItems(a, b, kSec); },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(Span(a), "[0,150)");
+                            EXPECT_EQ(Span(b), "[150,250)");
+                            EXPECT_EQ(b->GetMediaIn(), 4 * kSec);
+                            EXPECT_EQ(transition->GetStart(), 5500 * kSec / 1000);
+                            EXPECT_EQ(Span(c), "[300,350)");
+                            EXPECT_EQ(Span(aAudio), "[0,125)");  // a roll moves only the two clips
+                          }});
 }
 
 TEST_F(SequenceEditingTest, RollRefusesClipsThatDoNotMeet) {
@@ -149,19 +129,20 @@ TEST_F(SequenceEditingTest, RippleOfClipAsEndMovesEverythingAfterItOnItsAndItsLi
   // The transition's start may not go before A's start.
   EXPECT_EQ(SequenceActions::QueryTrimItems(items, Edge::End, -20 * kSec, true),
             -4500 * kSec / 1000);
-  DoCheckUndo(
-      SequenceActions::kRippleTrimItems,
-      [&] { return SequenceActions::TrimItems(items, Edge::End, kSec, true); },
-      [&] {
-        EXPECT_EQ(Span(a), "[0,150)");
-        EXPECT_EQ(Span(b), "[150,275)");
-        EXPECT_EQ(b->GetMediaIn(), 3 * kSec);
-        EXPECT_EQ(Span(c), "[325,375)");
-        EXPECT_EQ(transition->GetStart(), 5500 * kSec / 1000);
-        EXPECT_EQ(Span(aAudio), "[0,150)");
-        EXPECT_EQ(Span(bAudio), "[150,275)");
-        EXPECT_EQ(Span(cAudio), "[325,375)");
-      });
+  CheckUndoRoundTrip(
+      {.name = SequenceActions::kRippleTrimItems,
+       .edit = [&] { return SequenceActions::TrimItems(items, Edge::End, kSec, true); },
+       .checkEdited =
+           [&] {
+             EXPECT_EQ(Span(a), "[0,150)");
+             EXPECT_EQ(Span(b), "[150,275)");
+             EXPECT_EQ(b->GetMediaIn(), 3 * kSec);
+             EXPECT_EQ(Span(c), "[325,375)");
+             EXPECT_EQ(transition->GetStart(), 5500 * kSec / 1000);
+             EXPECT_EQ(Span(aAudio), "[0,150)");
+             EXPECT_EQ(Span(bAudio), "[150,275)");
+             EXPECT_EQ(Span(cAudio), "[325,375)");
+           }});
 }
 
 TEST_F(SequenceEditingTest, RippleOfTheClipAloneLeavesTheLinkedTrack) {
@@ -177,16 +158,17 @@ TEST_F(SequenceEditingTest, RippleOfClipBsStartTrimsItsHeadAndPullsTheRestIn) {
   EXPECT_EQ(SequenceActions::QueryTrimItems({b}, Edge::Start, -10 * kSec, true),
             -2500 * kSec / 1000);
   EXPECT_EQ(SequenceActions::QueryTrimItems({b}, Edge::Start, 10 * kSec, true), 5 * kSec - F(1));
-  DoCheckUndo(
-      SequenceActions::kRippleTrimItems,
-      [&] { return SequenceActions::TrimItems({b}, Edge::Start, kSec, true); },
-      [&] {
-        EXPECT_EQ(Span(b), "[125,225)");
-        EXPECT_EQ(b->GetMediaIn(), 4 * kSec);
-        EXPECT_EQ(Span(c), "[275,325)");
-        EXPECT_EQ(transition->GetStart(), 4500 * kSec / 1000);
-        EXPECT_EQ(Span(cAudio), "[300,350)");
-      });
+  CheckUndoRoundTrip(
+      {.name = SequenceActions::kRippleTrimItems,
+       .edit = [&] { return SequenceActions::TrimItems({b}, Edge::Start, kSec, true); },
+       .checkEdited =
+           [&] {
+             EXPECT_EQ(Span(b), "[125,225)");
+             EXPECT_EQ(b->GetMediaIn(), 4 * kSec);
+             EXPECT_EQ(Span(c), "[275,325)");
+             EXPECT_EQ(transition->GetStart(), 4500 * kSec / 1000);
+             EXPECT_EQ(Span(cAudio), "[300,350)");
+           }});
 }
 
 TEST_F(SequenceEditingTest, PlainTrimStopsAtTheNeighbourAndAtTheMedia) {
@@ -195,14 +177,15 @@ TEST_F(SequenceEditingTest, PlainTrimStopsAtTheNeighbourAndAtTheMedia) {
   // C's start may reach B's end at 10 s (its media would allow 2 s).
   EXPECT_EQ(SequenceActions::QueryTrimItems({c}, Edge::Start, -10 * kSec, false), -2 * kSec);
   EXPECT_EQ(SequenceActions::QueryTrimItems({c}, Edge::Start, 10 * kSec, false), 2 * kSec - F(1));
-  DoCheckUndo(
-      SequenceActions::kTrimItems,
-      [&] { return SequenceActions::TrimItems({c}, Edge::Start, -kSec, false); },
-      [&] {
-        EXPECT_EQ(Span(c), "[275,350)");
-        EXPECT_EQ(c->GetMediaIn(), 9 * kSec);
-        EXPECT_EQ(Span(cAudio), "[300,350)");
-      });
+  CheckUndoRoundTrip(
+      {.name = SequenceActions::kTrimItems,
+       .edit = [&] { return SequenceActions::TrimItems({c}, Edge::Start, -kSec, false); },
+       .checkEdited =
+           [&] {
+             EXPECT_EQ(Span(c), "[275,350)");
+             EXPECT_EQ(c->GetMediaIn(), 9 * kSec);
+             EXPECT_EQ(Span(cAudio), "[300,350)");
+           }});
 }
 
 TEST_F(SequenceEditingTest, EditsBeyondTheLimitsOrOnAReadOnlySequenceChangeNothing) {
@@ -224,15 +207,16 @@ TEST_F(SequenceEditingTest, EditsBeyondTheLimitsOrOnAReadOnlySequenceChangeNothi
 }
 
 TEST_F(SequenceEditingTest, RemovedItemsComeBackExactlyOnUndo) {
-  DoCheckUndo(
-      SequenceActions::kRemoveItems,
-      [&] {
-        return SequenceActions::RemoveItems({transition, c});
-      },
-      [&] {
-        EXPECT_EQ(transition->GetTrack(), nullptr);
-        EXPECT_EQ(v1->GetItems().size(), 2u);
-      });
+  CheckUndoRoundTrip({.name = SequenceActions::kRemoveItems,
+                      .edit =
+                          [&] {
+                            return SequenceActions::RemoveItems({transition, c});
+                          },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(transition->GetTrack(), nullptr);
+                            EXPECT_EQ(v1->GetItems().size(), 2u);
+                          }});
   EXPECT_EQ(transition->GetTrack(), v1.get());
 }
 

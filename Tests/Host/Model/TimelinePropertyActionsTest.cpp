@@ -29,7 +29,7 @@ class TimelinePropertyActionsTest : public EditingModelTest {
 };
 
 TEST_F(TimelinePropertyActionsTest, MarkersAddMoveRemoveAndClearAreEachUndoable) {
-  EditingMessageLog log;
+  MessageRecorder log;
   log.Listen(sequence->GetStation());
   ASSERT_EQ(MarkerActions::AddMarker(sequence, At(3 * kSec, "b")), EditStatus::Done);
   ASSERT_EQ(MarkerActions::AddMarker(sequence, At(kSec, "a")), EditStatus::Done);
@@ -161,15 +161,18 @@ TEST_F(TimelinePropertyActionsTest, RemoveAttributesDropsEffectsAndResetsIntrins
   const ComponentRef opacity = a->GetComponentChain()->FindByMatchName(kMatchName_Opacity);
   ASSERT_EQ(ComponentParamActions::AddKeyframe(opacity->FindParam("Opacity"), 3 * kSec, 20.0),
             EditStatus::Done);
-  const std::string before = State();
-  const std::size_t steps = project->GetUndoStack().GetUndoNames().size();
-  ASSERT_EQ(SequenceActions::RemoveAttributes({a, aAudio}), EditStatus::Done);
-  EXPECT_EQ(a->GetComponentChain()->GetCount(), 3);
-  EXPECT_FALSE(opacity->FindParam("Opacity")->IsTimeVarying());
-  EXPECT_EQ(opacity->FindParam("Opacity")->GetConstantValue(), ParamValue(100.0));
-  EXPECT_EQ(project->GetUndoStack().GetUndoNames().size(), steps + 1);
-  ASSERT_TRUE(project->GetUndoStack().Undo());
-  EXPECT_EQ(State(), before);
+  CheckUndoRoundTrip({.name = SequenceActions::kRemoveAttributes,
+                      .edit =
+                          [&] {
+                            return SequenceActions::RemoveAttributes({a, aAudio});
+                          },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(a->GetComponentChain()->GetCount(), 3);
+                            EXPECT_FALSE(opacity->FindParam("Opacity")->IsTimeVarying());
+                            EXPECT_EQ(opacity->FindParam("Opacity")->GetConstantValue(),
+                                      ParamValue(100.0));
+                          }});
   EXPECT_EQ(SequenceActions::RemoveAttributes({c}), EditStatus::NoChange);
 }
 

@@ -1,5 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <functional>
+#include <utility>
+
 #include "Host/Model/SequenceActions.h"
 #include "Host/Model/TransitionActions.h"
 #include "Host/Model/TransitionPercentActor.h"
@@ -9,19 +12,14 @@ namespace {
 
 class TransitionActionsTest : public EditingModelTest {
  protected:
-  // Runs an edit that must make one undo step named `name` and one TrackItemChangedMessage,
-  // then undoes it: the original state comes back with one more message.
-  template <class Edit>
-  void DoAndUndo(const char* name, Edit edit) {
-    const std::string before = State();
-    EditingMessageLog log;
-    log.Listen(transition->GetStation());
-    ASSERT_EQ(edit(), EditStatus::Done) << name;
-    EXPECT_EQ(project->GetUndoStack().GetUndoName(), name);
-    EXPECT_EQ(log.Count("TrackItemChangedMessage"), 1) << name;
-    ASSERT_TRUE(project->GetUndoStack().Undo());
-    EXPECT_EQ(State(), before) << name;
-    EXPECT_EQ(log.Count("TrackItemChangedMessage"), 2) << name;
+  // Checks a setting's edit: one undo step named `name` and one TrackItemChangedMessage on the
+  // transition for each of do, undo and redo.
+  void DoAndUndo(const char* name, std::function<EditStatus()> edit) {
+    MessageRecorder recorder;
+    recorder.Listen(transition->GetStation());
+    UndoRoundTrip(
+        *project, [this] { return State(); }, recorder)
+        .Check({.name = name, .edit = std::move(edit), .messages = {"TrackItemChangedMessage"}});
   }
 
   const TransitionData& Data() const { return transition->GetTransitionData(); }
@@ -100,13 +98,13 @@ TEST_F(TransitionActionsTest, ReadOnlySequenceRefusesEveryChange) {
 }
 
 TEST_F(TransitionActionsTest, DurationKeepsTheAlignmentAndIsLimitedByTheClips) {
-  const std::string before = State();
-  ASSERT_EQ(TransitionActions::SetDuration(transition, 2 * kSec), EditStatus::Done);
-  EXPECT_EQ(transition->GetStart(), 4 * kSec);
-  EXPECT_EQ(transition->GetEnd(), 6 * kSec);
-  EXPECT_EQ(project->GetUndoStack().GetUndoName(), TransitionActions::kSetDuration);
-  ASSERT_TRUE(project->GetUndoStack().Undo());
-  EXPECT_EQ(State(), before);
+  CheckUndoRoundTrip({.name = TransitionActions::kSetDuration,
+                      .edit = [&] { return TransitionActions::SetDuration(transition, 2 * kSec); },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(transition->GetStart(), 4 * kSec);
+                            EXPECT_EQ(transition->GetEnd(), 6 * kSec);
+                          }});
 
   // B's media starts at 2 s and B ends at 10 s: 20 s becomes [2 s, 10 s).
   ASSERT_EQ(TransitionActions::SetDuration(transition, 20 * kSec), EditStatus::Done);

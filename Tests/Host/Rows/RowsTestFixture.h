@@ -11,8 +11,8 @@
 #include "Host/Model/ComponentChain.h"
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectBuilder.h"
 #include "Host/Model/Sequence.h"
-#include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Rows/ParameterControl.h"
 #include "Host/Toolkit/SubView.h"
@@ -26,10 +26,6 @@ class RowsTest : public ::testing::Test {
   static constexpr TickTime kSecond = kTicksPerSecond;
 
   RowsTest() {
-    project->AddSequence(sequence);
-    sequence->AddTrack(track);
-    track->AddItem(clip);
-    clip->GetComponentChain()->Append(effect);
     host.SetRootView(listView);
     *editTime = 12 * kSecond;
   }
@@ -91,12 +87,18 @@ class RowsTest : public ::testing::Test {
   static constexpr int kListWidth = 400;
 
   MessagingTestScope messaging;
-  ProjectRef project = Project::Create("Rows");
-  SequenceRef sequence = Sequence::Create("Sequence");
-  TrackRef track = Track::Create(MediaType::Video, "V1");
-  TrackItemRef clip =
-      TrackItem::CreateClip(MediaType::Video, 10 * kSecond, 20 * kSecond, nullptr, 5 * kSecond);
-  ComponentRef effect = Component::Create("XO.Test Effect", "Test Effect", MediaType::Video, false);
+  ProjectBuilder builder{"Rows"};
+  ProjectRef project = builder.GetProject();
+  SequenceRef sequence = builder.AddSequence("Sequence");
+  TrackRef track = builder.AddTrack(sequence, MediaType::Video, "V1");
+  TrackItemRef clip = builder.AddClip(track, nullptr,
+                                      {.start = 10 * kSecond,
+                                       .end = 20 * kSecond,
+                                       .mediaIn = 5 * kSecond,
+                                       .withIntrinsics = false});
+  ComponentRef effect = builder.AddComponent(
+      clip->GetComponentChain(),
+      Component::Create("XO.Test Effect", "Test Effect", MediaType::Video, false));
   std::shared_ptr<TickTime> editTime = std::make_shared<TickTime>(0);
   ViewHost host{{kListWidth, 300}};
   std::shared_ptr<SubView> listView = std::make_shared<SubView>();
