@@ -5,7 +5,7 @@
 
 #include "Host/Messaging/Message.h"
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/SubView.h"
 
 class EffectControlsListView;
