@@ -10,7 +10,7 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // One parameter of a component. Its value is either constant, or, while it varies over time
 // ("time-varying", the stopwatch), given by its keyframes (a KeyframeCurve in clip time; before

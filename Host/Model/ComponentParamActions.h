@@ -11,7 +11,7 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Undoable edits of one parameter's value and keyframes. Each builds one action that records the
 // parameter's state before and after (so undo restores it exactly) and executes it on the

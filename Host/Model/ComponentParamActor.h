@@ -3,7 +3,7 @@
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // An edit of one parameter that spans a gesture (a slider drag): constructing it begins the
 // edit at a clip time; SetValue changes the model at once, without an undo step (a time-varying

@@ -4,7 +4,7 @@
 #include <cmath>
 #include <cstdint>
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 enum class CurveSegmentShape : std::uint8_t { Hold, Linear, Bezier };
 

@@ -2,7 +2,7 @@
 
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Undoable intro and outro durations of a graphics clip (the regions at its start and end that
 // play its in and out animations). Only a graphics clip that is not a master graphic and whose

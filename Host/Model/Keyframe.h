@@ -4,7 +4,7 @@
 #include <optional>
 
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // How the value travels in time, with the host's codes. A keyframe has one temporal mode that
 // governs both of its sides: the segment after a Hold keyframe keeps its value until the next

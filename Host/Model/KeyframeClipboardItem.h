@@ -8,7 +8,7 @@
 #include "Host/Model/ClipboardItem.h"
 #include "Host/Model/Keyframe.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Copied keyframes of one or more parameters. Times are offsets from the earliest copied
 // keyframe (over all parameters), so a paste places that keyframe at the paste time and keeps

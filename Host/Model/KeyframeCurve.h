@@ -10,7 +10,7 @@
 #include "Host/Model/CurveSegment.h"
 #include "Host/Model/Keyframe.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 enum class CurveStatus {
   Ok,

@@ -7,7 +7,7 @@
 #include "Host/Model/Keyframe.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 inline constexpr const char* kKeyframeActionMoveHandle = "MZ.KeyframeSelection.MoveHandle";
 

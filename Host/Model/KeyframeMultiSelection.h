@@ -8,7 +8,7 @@
 #include "Host/Model/KeyframeSelection.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // The selected keyframes over several parameters: one KeyframeSelection per parameter, in the
 // order the parameters were first added. The effect list holds one for its sequence (shared with

@@ -9,7 +9,7 @@
 #include "Host/Model/KeyframeMultiSelection.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // A keyframe drag: moves the selected keyframes of a KeyframeMultiSelection live, without undo
 // steps, while the mouse moves, then commits the whole gesture as one undoable action or rolls

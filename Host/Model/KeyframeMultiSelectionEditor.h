@@ -7,7 +7,7 @@
 #include "Host/Model/KeyframeMultiSelection.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // The clipboard side of a keyframe selection: copy, cut and paste of keyframes through the
 // project's clipboard (KeyframeClipboardItem). Copying is not an edit (no undo step); cut and

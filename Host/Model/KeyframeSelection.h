@@ -12,7 +12,7 @@
 #include "Host/Model/KeyframeCurve.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Interpolation capabilities asked of a selection (SupportsInterpolationMode), host codes.
 inline constexpr int kInterpolationCapabilityLinear = 0;

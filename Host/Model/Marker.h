@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // A marker of a sequence or a master clip, at a time of its owner (sequence time for sequence
 // markers, media time for master-clip markers).

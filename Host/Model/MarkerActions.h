@@ -5,7 +5,7 @@
 #include "Host/Model/Marker.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Undoable edits of the markers of a sequence (sequence time) or a master clip (media time).
 // Each records the owner's markers before and after (MarkersChangedMessage both ways); NoChange

@@ -7,7 +7,7 @@
 #include "Host/Model/Markers.h"
 #include "Host/Model/ModelObject.h"
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Set on a master clip whose project is not the active one; its effects are then read only.
 inline constexpr const char* kPropertyKey_FromInactiveProject = "MZ.FromInactiveProject";

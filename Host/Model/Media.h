@@ -2,10 +2,10 @@
 
 #include <string>
 
-#include "Host/Model/FrameRate.h"
 #include "Host/Model/ModelObject.h"
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 
 // A piece of source media: what a master clip plays. Its time runs from 0 to its duration; a
 // generated media (graphics, titles) has no end and gives kTime_Max.

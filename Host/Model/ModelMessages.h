@@ -14,8 +14,8 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/Sequence.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Model/TrackItem.h"
+#include "Host/Time/TickTime.h"
 
 // The model's change messages. They go out on do, undo and redo alike, and on live edits. Each
 // says on which station it is sent; payload references keep their objects alive, so a message may

@@ -6,7 +6,7 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/PlayerClock.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // A simulated player: a position that advances with a clock while playing, over a range, at a
 // speed, optionally looping. There is no audio or video device; what plays is the position and

@@ -2,7 +2,7 @@
 
 #include <memory>
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // The time source of a player: a monotonic time in ticks. Players measure how much time passed
 // between two steps; the origin does not matter. The steady clock is the machine's; tests use

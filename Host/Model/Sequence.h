@@ -5,13 +5,13 @@
 #include <string>
 #include <vector>
 
-#include "Host/Model/FrameRate.h"
 #include "Host/Model/Markers.h"
 #include "Host/Model/ModelObject.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Model/TrackItemGroup.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 
 // Property keys carried by PropertiesChangedMessage for a sequence or master clip.
 inline constexpr const char* kPropertyKey_InPoint = "MZ.InPoint";

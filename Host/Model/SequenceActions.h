@@ -5,7 +5,7 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/SequenceEditing.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // The undoable sequence edits: each runs one SequenceEditing function (or an effect edit) as one
 // undo step on the sequence's project. The Query functions answer how far an edit may go: the

@@ -7,8 +7,8 @@
 #include "Host/Model/Action.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Model/TransitionData.h"
+#include "Host/Time/TickTime.h"
 
 // Wraps a plain timeline edit (SequenceEditing) in an undoable action. The first Do records the
 // sequence's tracks (which items each holds, their times and transition settings), runs the edit

@@ -6,10 +6,10 @@
 #include <set>
 
 #include "Host/Messaging/Diagnostics.h"
-#include "Host/Model/FrameRate.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
+#include "Host/Time/FrameRate.h"
 
 namespace {
 

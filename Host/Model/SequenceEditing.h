@@ -4,7 +4,7 @@
 
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // The timeline edits as plain functions over the model: each checks what it may do, changes the
 // items' times directly (no undo step, no partial change: an edit either applies whole or returns

@@ -4,7 +4,7 @@
 
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Undoable in and out points of a sequence (sequence time) or a master clip (media time). nullopt
 // clears a point. Points are not negative, and in never lies after out (TimeOutOfRange); a master

@@ -2,7 +2,7 @@
 
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Undoable settings of a sequence that the panel changes: frame alignment (whether times snap to
 // audio samples or video frames) and the zero point of its timecode. One step each, recording the

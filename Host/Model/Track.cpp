@@ -52,7 +52,7 @@ bool Track::RemoveItem(const TrackItem* item) {
 std::vector<TrackItemRef> Track::FindItemsAt(TickTime time) const {
   std::vector<TrackItemRef> found;
   for (const TrackItemRef& item : mItems) {
-    if (item->GetStart() <= time && time < item->GetEnd()) {
+    if (item->GetSpan().Contains(time)) {
       found.push_back(item);
     }
   }

@@ -5,7 +5,7 @@
 
 #include "Host/Model/ModelObject.h"
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // One video or audio track of a sequence: its track items (clips and transitions), ordered by
 // start time. Owns its items. Adding and removing are not undoable: they are for building,

@@ -31,6 +31,12 @@ TickTime ScaleSpan(TickTime span, double factor) {
   return static_cast<TickTime>(scaled);
 }
 
+// A span that can be stored: an unstorable start becomes 0, an unstorable or earlier end the start.
+TimeRange ClampedSpan(TickTime start, TickTime end) {
+  const TickTime first = IsStorableTime(start) ? start : 0;
+  return {first, IsStorableTime(end) && end >= first ? end : first};
+}
+
 }  // namespace
 
 TrackItemRef TrackItem::CreateClip(MediaType mediaType, TickTime start, TickTime end,
@@ -53,8 +59,7 @@ TrackItem::TrackItem(TrackItemKind kind, MediaType mediaType, TickTime start, Ti
     : ModelObject("TrackItem"),
       mKind(kind),
       mMediaType(mediaType),
-      mStart(IsStorableTime(start) ? start : 0),
-      mEnd(IsStorableTime(end) && end >= mStart ? end : mStart),
+      mSpan(ClampedSpan(start, end)),
       mChain(ComponentChain::Create(mediaType)),
       mLabelColor(mediaType == MediaType::Video ? kDefaultVideoLabel : kDefaultAudioLabel) {
   mChain->SetOwner(this);
@@ -68,11 +73,10 @@ bool TrackItem::SetTimes(TickTime start, TickTime end, TickTime mediaIn) {
   if (!IsStorableTime(start) || !IsStorableTime(end) || !IsStorableTime(mediaIn) || end < start) {
     return false;
   }
-  if (start == mStart && end == mEnd && mediaIn == mMediaIn) {
+  if (start == mSpan.start && end == mSpan.end && mediaIn == mMediaIn) {
     return true;
   }
-  mStart = start;
-  mEnd = end;
+  mSpan = {start, end};
   mMediaIn = mediaIn;
   NotifyTimingChanged();
   return true;
@@ -90,11 +94,11 @@ bool TrackItem::SetSpeed(double speed) {
 }
 
 TickTime TrackItem::SequenceTimeToClipTime(TickTime sequenceTime) const {
-  return AddTimes(mMediaIn, ScaleSpan(SubtractTimes(sequenceTime, mStart), mSpeed));
+  return AddTimes(mMediaIn, ScaleSpan(SubtractTimes(sequenceTime, mSpan.start), mSpeed));
 }
 
 TickTime TrackItem::ClipTimeToSequenceTime(TickTime clipTime) const {
-  return AddTimes(mStart, ScaleSpan(SubtractTimes(clipTime, mMediaIn), 1.0 / mSpeed));
+  return AddTimes(mSpan.start, ScaleSpan(SubtractTimes(clipTime, mMediaIn), 1.0 / mSpeed));
 }
 
 TickTime TrackItem::GetMediaStartInSequence() const {

@@ -4,11 +4,12 @@
 #include <string>
 #include <vector>
 
-#include "Host/Model/FrameRate.h"
 #include "Host/Model/ModelObject.h"
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Model/TransitionData.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
+#include "Host/Time/TimeRange.h"
 
 // A clip or a transition on a track. Times:
 //   sequence time  the sequence's time line; start and end are in it;
@@ -38,9 +39,11 @@ class TrackItem : public ModelObject {
   bool IsTransition() const { return mKind == TrackItemKind::Transition; }
   MediaType GetMediaType() const { return mMediaType; }
 
-  TickTime GetStart() const { return mStart; }
-  TickTime GetEnd() const { return mEnd; }
-  TickTime GetDuration() const { return mEnd - mStart; }
+  TickTime GetStart() const { return mSpan.start; }
+  TickTime GetEnd() const { return mSpan.end; }
+  TickTime GetDuration() const { return mSpan.Duration(); }
+  // [start, end) in sequence time.
+  const TimeRange& GetSpan() const { return mSpan; }
   TickTime GetMediaIn() const { return mMediaIn; }
   // start <= end, both storable; `mediaIn` is the media time at `start`.
   bool SetTimes(TickTime start, TickTime end, TickTime mediaIn);
@@ -56,8 +59,8 @@ class TrackItem : public ModelObject {
   // kTime_Min / kTime_Max when the media has no limit on that side (generated media, no media).
   TickTime GetMediaStartInSequence() const;
   TickTime GetMediaEndInSequence() const;
-  bool HasHeadMaterial() const { return GetMediaStartInSequence() < mStart; }
-  bool HasTailMaterial() const { return GetMediaEndInSequence() > mEnd; }
+  bool HasHeadMaterial() const { return GetMediaStartInSequence() < mSpan.start; }
+  bool HasTailMaterial() const { return GetMediaEndInSequence() > mSpan.end; }
 
   const MasterClipRef& GetMasterClip() const { return mMasterClip; }
   // The item's own name, else its master clip's, else the transition's display name.
@@ -119,8 +122,7 @@ class TrackItem : public ModelObject {
 
   TrackItemKind mKind;
   MediaType mMediaType;
-  TickTime mStart;
-  TickTime mEnd;
+  TimeRange mSpan;  // sequence time
   TickTime mMediaIn = 0;
   double mSpeed = 1.0;
   MasterClipRef mMasterClip;

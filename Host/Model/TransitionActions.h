@@ -7,7 +7,7 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Undoable edits of a transition's settings. Each is one undo step that records the transition's
 // settings before and after (TrackItemChangedMessage both ways). Bad values are refused with

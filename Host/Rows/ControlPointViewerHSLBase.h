@@ -1,7 +1,7 @@
 #pragma once
 
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/Geometry.h"
 
 class ControlPointViewerHSLBase;

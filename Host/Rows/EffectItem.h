@@ -9,7 +9,7 @@
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Message.h"
 #include "Host/Messaging/Station.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/Color.h"
 #include "Host/Toolkit/Geometry.h"
 

@@ -9,12 +9,12 @@
 
 #include "Host/Messaging/Message.h"
 #include "Host/Messaging/Station.h"
-#include "Host/Model/FrameRate.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Rows/ControlPointViewerHSLBase.h"
 #include "Host/Rows/EffectItem.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/Commander.h"
 
 class ComponentParamActor;

@@ -10,9 +10,9 @@
 #include "Host/Messaging/PropertyList.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Shell/HostTool.h"
 #include "Host/Shell/ShellIdentifiers.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/CommandStatus.h"
 #include "Host/Toolkit/Geometry.h"
 

@@ -7,7 +7,7 @@
 #include <variant>
 #include <vector>
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // What a tab view reports of its state for the automation dump (`dump FILE.json`). Plain data:
 // the view fills it, the shell writes it out as JSON. Coordinates are the view's own pixels.

@@ -4,7 +4,7 @@
 #include <string_view>
 
 #include "Host/Messaging/Message.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/Color.h"
 #include "Host/Toolkit/Geometry.h"
 #include "Host/Toolkit/KeyModifiers.h"

@@ -4,8 +4,8 @@
 #include <string>
 #include <string_view>
 
-#include "Host/Model/FrameRate.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/HotTextControl.h"
 
 // A time shown as timecode in hot text (see HotTextControl for the gestures): the current-time

@@ -6,8 +6,8 @@
 #include <string>
 #include <vector>
 
-#include "Host/Model/FrameRate.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/ControlStation.h"
 #include "Host/Toolkit/SubView.h"
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/SubView.h"
 
 class TimeBarControl;

@@ -2,7 +2,7 @@
 
 #include <limits>
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 // Limits of a time view's zoom: how far out (the whole duration across the scroll width) and how
 // far in (a frame, or an audio sample in audio time units, at most kMaxPixelsPerFrame or

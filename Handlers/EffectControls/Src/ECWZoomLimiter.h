@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/ZoomLimiter.h"
 
 // The panel's zoom limits: the keyframe area may show [minimum, maximum] (sequence ticks) and

@@ -6,7 +6,7 @@
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Message.h"
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/SubView.h"
 
 class EffectControlsListView;

@@ -12,9 +12,9 @@
 #include "Host/Messaging/Message.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Model/TrackItemGroup.h"
 #include "Host/Shell/StateDumpSource.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/TabView.h"
 
 class EffectControlsKeyframeView;

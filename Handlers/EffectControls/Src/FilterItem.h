@@ -9,8 +9,8 @@
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Rows/EffectItem.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/Commander.h"
 
 class CheckBoxControl;

@@ -6,7 +6,7 @@
 #include <vector>
 
 #include "Host/Model/ModelRefs.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/TimeBarControl.h"
 
 // The panel's view of its sequence's markers: what the time ruler shows, which markers the user

@@ -11,7 +11,7 @@
 #include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Station.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/ScriptedMenuTracker.h"

@@ -1,10 +1,10 @@
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 #include <algorithm>
 #include <cmath>
 #include <limits>
 
-#include "Host/Model/FrameRate.h"
+#include "Host/Time/FrameRate.h"
 
 namespace {
 

@@ -3,7 +3,7 @@
 #include <cmath>
 #include <limits>
 
-#include "Host/Model/FrameRate.h"
+#include "Host/Time/FrameRate.h"
 
 namespace {
 

@@ -1,4 +1,4 @@
-#include "Host/Model/FrameRate.h"
+#include "Host/Time/FrameRate.h"
 
 #include <cctype>
 #include <cmath>

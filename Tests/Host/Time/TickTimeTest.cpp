@@ -3,8 +3,8 @@
 #include <cmath>
 #include <limits>
 
-#include "Host/Model/FrameRate.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 
 namespace {
 

@@ -5,7 +5,7 @@
 #include <string>
 #include <string_view>
 
-#include "Host/Model/TickTime.h"
+#include "Host/Time/TickTime.h"
 
 enum class TimecodeError {
   None,
