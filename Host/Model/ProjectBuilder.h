@@ -6,13 +6,13 @@
 #include <utility>
 #include <vector>
 
-#include "Host/Model/FrameRate.h"
 #include "Host/Model/Keyframe.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Model/TransitionData.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 
 // Builds a project in code (tests, the example files, the program's demo): media, master clips,
 // sequences, tracks, clips carrying the catalogue's intrinsics, transitions, effects and

@@ -15,8 +15,8 @@
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/EffectCatalogue.h"
 #include "Host/Model/ParamValue.h"
-#include "Host/Model/TickTime.h"
 #include "Host/Model/TrackItem.h"
+#include "Host/Time/TickTime.h"
 
 namespace {
 

@@ -5,8 +5,8 @@
 
 #include "Host/Messaging/Message.h"
 #include "Host/Messaging/Station.h"
-#include "Host/Model/FrameRate.h"
-#include "Host/Model/TickTime.h"
+#include "Host/Time/FrameRate.h"
+#include "Host/Time/TickTime.h"
 
 // The panel's one record of time: the edit line, the keyframe area's visible start and zoom
 // (seconds per pixel, with the frame rate whose frame lasts one pixel), and the span of the
