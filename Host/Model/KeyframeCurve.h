@@ -143,6 +143,11 @@ class KeyframeCurve {
  private:
   friend class Sampler;
 
+  // Points and colours: the temporal curve gives the distance travelled along their path.
+  static bool IsPathKind(ParamValueKind kind);
+  // Influences are kept to float precision, the precision the segments hold them in.
+  static double ClampInfluence(double influence);
+
   CurveStatus Validate(Keyframe& keyframe, std::optional<std::size_t> ignoring) const;
   void InsertKey(std::size_t index, const Keyframe& keyframe);
   void EraseKey(std::size_t index);

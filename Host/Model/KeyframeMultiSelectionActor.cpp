@@ -13,6 +13,7 @@
 #include "Host/Model/Project.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/TrackItem.h"
+#include "Host/Time/TimePoint.h"
 
 namespace {
 
@@ -28,8 +29,8 @@ ClipBounds BoundsFor(const KeyframeSelection& selection, const Sequence* sequenc
     bounds.frame = sequence->GetVideoFrameRate().GetTicksPerFrame();
   }
   if (const TrackItem* item = selection.GetTrackItem().get()) {
-    bounds.first = item->SequenceTimeToClipTime(item->GetStart());
-    bounds.last = item->SequenceTimeToClipTime(item->GetEnd());
+    bounds.first = item->SequenceTimeToClipTime(SequenceTime(item->GetStart())).Ticks();
+    bounds.last = item->SequenceTimeToClipTime(SequenceTime(item->GetEnd())).Ticks();
     const double frame =
         std::round(static_cast<double>(item->GetFrameRate().GetTicksPerFrame()) * item->GetSpeed());
     bounds.frame = std::max<TickTime>(1, static_cast<TickTime>(frame));

@@ -10,6 +10,7 @@
 #include "Host/Model/Project.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/TrackItem.h"
+#include "Host/Time/TimePoint.h"
 
 namespace {
 
@@ -214,14 +215,16 @@ EditStatus KeyframeMultiSelectionEditor::Paste(const SequenceRef& sequence,
   if (!item) {
     return EditStatus::NoChange;
   }
-  const TickTime editTime = sequence ? sequence->GetCurrentTime() : kTime_Zero;
+  const SequenceTime editTime(sequence ? sequence->GetCurrentTime() : kTime_Zero);
   const TrackItem* trackItem = chain->GetTrackItem();
-  const TickTime clipTime = trackItem ? trackItem->SequenceTimeToClipTime(editTime) : editTime;
+  // A master clip's chain has no track item: its clip time is read off the edit line as it is.
+  const ClipTime clipTime =
+      trackItem ? trackItem->SequenceTimeToClipTime(editTime) : ClipTime(editTime.Ticks());
   return PasteAt(*item, chain, clipTime, selection);
 }
 
 EditStatus KeyframeMultiSelectionEditor::PasteAt(const KeyframeClipboardItem& item,
-                                                 const ComponentChainRef& chain, TickTime clipTime,
+                                                 const ComponentChainRef& chain, ClipTime clipTime,
                                                  KeyframeMultiSelection* selection) {
   if (!HOST_VERIFY(chain != nullptr, "Invalid ComponentChain")) {
     return EditStatus::InvalidArgument;
@@ -244,7 +247,7 @@ EditStatus KeyframeMultiSelectionEditor::PasteAt(const KeyframeClipboardItem& it
     }
     Pasted record{target, {}};
     for (Keyframe keyframe : copied.keyframes) {
-      keyframe.time = AddTimes(clipTime, keyframe.time);
+      keyframe.time = AddTimes(clipTime.Ticks(), keyframe.time);
       const std::optional<ParamValue> value = target->Coerce(keyframe.value);
       if (!value || !IsStorableTime(keyframe.time)) {
         return value ? EditStatus::TimeOutOfRange : EditStatus::InvalidArgument;

@@ -8,6 +8,7 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Time/TickTime.h"
+#include "Host/Time/TimePoint.h"
 
 // The clipboard side of a keyframe selection: copy, cut and paste of keyframes through the
 // project's clipboard (KeyframeClipboardItem). Copying is not an edit (no undo step); cut and
@@ -44,7 +45,7 @@ class KeyframeMultiSelectionEditor {
                           KeyframeMultiSelection* selection = nullptr);
   // Pastes `item` so that its earliest keyframe lands at `clipTime`.
   static EditStatus PasteAt(const KeyframeClipboardItem& item, const ComponentChainRef& chain,
-                            TickTime clipTime, KeyframeMultiSelection* selection = nullptr);
+                            ClipTime clipTime, KeyframeMultiSelection* selection = nullptr);
 
   // The parameter of `chain` that a copied parameter pastes into, or null.
   static ComponentParamRef FindTarget(const KeyframeClipboardItem::ParamKeyframes& copied,

@@ -10,6 +10,7 @@
 #include "Host/Model/Track.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Time/FrameRate.h"
+#include "Host/Time/TimePoint.h"
 
 namespace {
 
@@ -302,7 +303,7 @@ EditStatus SequenceEditing::Roll(TrackItem& clipA, TrackItem& clipB, TickTime de
   }
   const TrackItemRef transition = FindTransitionAt(clipA, Edge::End);
   const TickTime newCut = clipA.GetEnd() + delta;
-  const TickTime bMediaIn = clipB.SequenceTimeToClipTime(newCut);
+  const TickTime bMediaIn = clipB.SequenceTimeToClipTime(SequenceTime(newCut)).Ticks();
   Batch batch(SequenceOf(clipA));
   clipA.SetTimes(clipA.GetStart(), newCut, clipA.GetMediaIn());
   clipB.SetTimes(newCut, clipB.GetEnd(), bMediaIn);
@@ -386,7 +387,8 @@ EditStatus SequenceEditing::RippleTrim(const std::vector<TrackItemRef>& items, E
     if (edge == Edge::End) {
       item->SetTimes(item->GetStart(), item->GetEnd() + delta, item->GetMediaIn());
     } else {
-      const TickTime mediaIn = item->SequenceTimeToClipTime(item->GetStart() + delta);
+      const TickTime mediaIn =
+          item->SequenceTimeToClipTime(SequenceTime(item->GetStart()) + delta).Ticks();
       item->SetTimes(item->GetStart(), item->GetEnd() - delta, mediaIn);
     }
   }
@@ -436,7 +438,8 @@ EditStatus SequenceEditing::Trim(TrackItem& clip, Edge edge, TickTime delta) {
   if (edge == Edge::End) {
     clip.SetTimes(clip.GetStart(), clip.GetEnd() + delta, clip.GetMediaIn());
   } else {
-    const TickTime mediaIn = clip.SequenceTimeToClipTime(clip.GetStart() + delta);
+    const TickTime mediaIn =
+        clip.SequenceTimeToClipTime(SequenceTime(clip.GetStart()) + delta).Ticks();
     clip.SetTimes(clip.GetStart() + delta, clip.GetEnd(), mediaIn);
   }
   return EditStatus::Done;

@@ -93,12 +93,14 @@ bool TrackItem::SetSpeed(double speed) {
   return true;
 }
 
-TickTime TrackItem::SequenceTimeToClipTime(TickTime sequenceTime) const {
-  return AddTimes(mMediaIn, ScaleSpan(SubtractTimes(sequenceTime, mSpan.start), mSpeed));
+ClipTime TrackItem::SequenceTimeToClipTime(SequenceTime sequenceTime) const {
+  return ClipTime(
+      AddTimes(mMediaIn, ScaleSpan(SubtractTimes(sequenceTime.Ticks(), mSpan.start), mSpeed)));
 }
 
-TickTime TrackItem::ClipTimeToSequenceTime(TickTime clipTime) const {
-  return AddTimes(mSpan.start, ScaleSpan(SubtractTimes(clipTime, mMediaIn), 1.0 / mSpeed));
+SequenceTime TrackItem::ClipTimeToSequenceTime(ClipTime clipTime) const {
+  return SequenceTime(
+      AddTimes(mSpan.start, ScaleSpan(SubtractTimes(clipTime.Ticks(), mMediaIn), 1.0 / mSpeed)));
 }
 
 TickTime TrackItem::GetMediaStartInSequence() const {
@@ -106,7 +108,7 @@ TickTime TrackItem::GetMediaStartInSequence() const {
   if (!media || media->IsGenerated()) {
     return kTime_Min;
   }
-  return ClipTimeToSequenceTime(0);
+  return ClipTimeToSequenceTime(ClipTime(0)).Ticks();
 }
 
 TickTime TrackItem::GetMediaEndInSequence() const {
@@ -114,7 +116,7 @@ TickTime TrackItem::GetMediaEndInSequence() const {
   if (!media || media->IsGenerated()) {
     return kTime_Max;
   }
-  return ClipTimeToSequenceTime(media->GetDuration());
+  return ClipTimeToSequenceTime(ClipTime(media->GetDuration())).Ticks();
 }
 
 std::string TrackItem::GetName() const {

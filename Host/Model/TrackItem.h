@@ -9,6 +9,7 @@
 #include "Host/Model/TransitionData.h"
 #include "Host/Time/FrameRate.h"
 #include "Host/Time/TickTime.h"
+#include "Host/Time/TimePoint.h"
 #include "Host/Time/TimeRange.h"
 
 // A clip or a transition on a track. Times:
@@ -52,8 +53,10 @@ class TrackItem : public ModelObject {
   double GetSpeed() const { return mSpeed; }
   bool SetSpeed(double speed);
 
-  TickTime SequenceTimeToClipTime(TickTime sequenceTime) const;
-  TickTime ClipTimeToSequenceTime(TickTime clipTime) const;
+  // Between the two time lines: every conversion comes here (rows through their own). Both
+  // saturate at the sentinels.
+  ClipTime SequenceTimeToClipTime(SequenceTime sequenceTime) const;
+  SequenceTime ClipTimeToSequenceTime(ClipTime clipTime) const;
 
   // Where the clip's media starts and ends in sequence time: start - head and end + tail.
   // kTime_Min / kTime_Max when the media has no limit on that side (generated media, no media).

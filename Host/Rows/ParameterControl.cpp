@@ -162,7 +162,7 @@ void ParameterControl::GetKeyframeTimes(std::set<TickTime>& times, bool toSequen
     return;
   }
   for (const TickTime time : mParam->GetKeyframeTimes()) {
-    times.insert(toSequenceTime ? ClipTimeToSequenceTime(time) : time);
+    times.insert(toSequenceTime ? ClipTimeToSequenceTime(ClipTime(time)).Ticks() : time);
   }
 }
 
@@ -237,12 +237,13 @@ ParamValue ParameterControl::GetValueAtEditTime() const {
   return mParam ? mParam->GetValueAt(GetClipEditTime()) : ParamValue(0.0);
 }
 
-TickTime ParameterControl::SequenceTimeToClipTime(TickTime sequenceTime) const {
-  return mTrackItem ? mTrackItem->SequenceTimeToClipTime(sequenceTime) : sequenceTime;
+ClipTime ParameterControl::SequenceTimeToClipTime(SequenceTime sequenceTime) const {
+  return mTrackItem ? mTrackItem->SequenceTimeToClipTime(sequenceTime)
+                    : ClipTime(sequenceTime.Ticks());
 }
 
-TickTime ParameterControl::ClipTimeToSequenceTime(TickTime clipTime) const {
-  return mTrackItem ? mTrackItem->ClipTimeToSequenceTime(clipTime) : clipTime;
+SequenceTime ParameterControl::ClipTimeToSequenceTime(ClipTime clipTime) const {
+  return mTrackItem ? mTrackItem->ClipTimeToSequenceTime(clipTime) : SequenceTime(clipTime.Ticks());
 }
 
 void ParameterControl::RefreshDisplayName() {
@@ -361,7 +362,8 @@ void ParameterControl::DrawKeyframes(DC& dc, const Rect& rowRect, TickTime visib
   const int glyphTop = rowRect.top + kKeyframeStripHeight / 2 - 8;
   for (std::size_t i = 0; i < keys.size(); ++i) {
     const std::int64_t x =
-        rowRect.left + PixelOf(ClipTimeToSequenceTime(keys[i].time), visibleStart, pixelRate);
+        rowRect.left +
+        PixelOf(ClipTimeToSequenceTime(ClipTime(keys[i].time)).Ticks(), visibleStart, pixelRate);
     if (x + 16 < clip.left || x - 16 > clip.right) {
       continue;
     }
@@ -377,7 +379,7 @@ bool ParameterControl::HitKeyframe(Point point, TickTime originTime, const Frame
     return false;
   }
   for (const Keyframe& key : mParam->GetKeyframes().Keyframes()) {
-    const TickTime time = ClipTimeToSequenceTime(key.time);
+    const TickTime time = ClipTimeToSequenceTime(ClipTime(key.time)).Ticks();
     const std::int64_t x = PixelOf(time, originTime, timeScale);
     if (x - kKeyframeHitTolerance < point.x && point.x < x + kKeyframeHitTolerance && time >= 0) {
       hitTime = time;

@@ -15,6 +15,7 @@
 #include "Host/Rows/EffectItem.h"
 #include "Host/Time/FrameRate.h"
 #include "Host/Time/TickTime.h"
+#include "Host/Time/TimePoint.h"
 #include "Host/Toolkit/Commander.h"
 
 class ComponentParamActor;
@@ -138,12 +139,14 @@ class ParameterControl : public EffectItem, public Commander {
   // --- Time ---
   // The edit line in sequence time, and the same instant in clip time.
   TickTime GetEditTime() const;
-  TickTime GetClipEditTime() const { return SequenceTimeToClipTime(GetEditTime()); }
+  TickTime GetClipEditTime() const {
+    return SequenceTimeToClipTime(SequenceTime(GetEditTime())).Ticks();
+  }
   // The parameter's value at the edit time (its default when the row has no parameter).
   ParamValue GetValueAtEditTime() const;
   // Through the track item; the identity without one.
-  TickTime SequenceTimeToClipTime(TickTime sequenceTime) const;
-  TickTime ClipTimeToSequenceTime(TickTime clipTime) const;
+  ClipTime SequenceTimeToClipTime(SequenceTime sequenceTime) const;
+  SequenceTime ClipTimeToSequenceTime(ClipTime clipTime) const;
 
   // --- Showing the value ---
   // Reads the parameter at the edit time into the row's controls. Called when the edit time

@@ -224,9 +224,9 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
     const auto& keys = control->GetParam()->GetKeyframes().Keyframes();
     const int centreY = top + row->OwnHeight() / 2;
     for (std::size_t i = 0; i < keys.size(); ++i) {
-      const TickTime sequenceTime = control->GetTrackItem()
-                                        ? control->ClipTimeToSequenceTime(keys[i].time)
-                                        : keys[i].time - mediaIn + trackStart;
+      const TickTime sequenceTime =
+          control->GetTrackItem() ? control->ClipTimeToSequenceTime(ClipTime(keys[i].time)).Ticks()
+                                  : keys[i].time - mediaIn + trackStart;
       const int x = static_cast<int>(std::lround(TimeToX(sequenceTime)));
       if (x < -8 || x > bounds.Width() + 8) {
         continue;

@@ -264,10 +264,10 @@ void EffectControlsView::ReloadInOutMarks() {
   if (const TrackItemRef item = GetMasterClipItem()) {
     // The master clip's points are media times; the ruler shows them where the clip plays them.
     if (const auto clipIn = GetMasterClip()->GetInPoint()) {
-      in = item->ClipTimeToSequenceTime(*clipIn);
+      in = item->ClipTimeToSequenceTime(ClipTime(*clipIn)).Ticks();
     }
     if (const auto clipOut = GetMasterClip()->GetOutPoint()) {
-      out = item->ClipTimeToSequenceTime(*clipOut);
+      out = item->ClipTimeToSequenceTime(ClipTime(*clipOut)).Ticks();
     }
   } else if (mSequence) {
     in = mSequence->GetInPoint();
@@ -314,7 +314,9 @@ void EffectControlsView::OnMarkTime(const Message& message) {
   if (const TrackItemRef item = GetMasterClipItem()) {
     // In master-clip mode the points are the clip's media times.
     const auto toClip = [&item](std::optional<TickTime> time) {
-      return time ? std::optional<TickTime>(item->SequenceTimeToClipTime(*time)) : time;
+      return time ? std::optional<TickTime>(
+                        item->SequenceTimeToClipTime(SequenceTime(*time)).Ticks())
+                  : time;
     };
     if (setIn && setOut) {
       SequencePropertyActions::SetInOutPoints(GetMasterClip(), toClip(in), toClip(out));
@@ -341,9 +343,10 @@ bool EffectControlsView::NavigateMasterClip(MasterClipNavigation code) {
   if (!item) {
     return false;
   }
-  const TickTime clipTime = item->SequenceTimeToClipTime(mTimeline->GetEditTime());
+  const TickTime clipTime =
+      item->SequenceTimeToClipTime(SequenceTime(mTimeline->GetEditTime())).Ticks();
   const auto goTo = [this, &item](TickTime time) {
-    SetEditTime(item->ClipTimeToSequenceTime(time));
+    SetEditTime(item->ClipTimeToSequenceTime(ClipTime(time)).Ticks());
     return true;
   };
   switch (code) {

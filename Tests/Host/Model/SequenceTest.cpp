@@ -57,12 +57,12 @@ TEST_F(SequenceTest, ABatchOfChangesIsAnnouncedOnce) {
 
 TEST_F(SequenceTest, ClipTimeIsMediaTimeSoKeyframesStayWithThePictures) {
   // Video: [2 s, 7 s) showing media from 1 s.
-  EXPECT_EQ(video->SequenceTimeToClipTime(2 * kSecond), 1 * kSecond);
-  EXPECT_EQ(video->SequenceTimeToClipTime(4 * kSecond), 3 * kSecond);
-  EXPECT_EQ(video->ClipTimeToSequenceTime(3 * kSecond), 4 * kSecond);
+  EXPECT_EQ(video->SequenceTimeToClipTime(SequenceTime(2 * kSecond)).Ticks(), 1 * kSecond);
+  EXPECT_EQ(video->SequenceTimeToClipTime(SequenceTime(4 * kSecond)).Ticks(), 3 * kSecond);
+  EXPECT_EQ(video->ClipTimeToSequenceTime(ClipTime(3 * kSecond)).Ticks(), 4 * kSecond);
   video->SetSpeed(2.0);
-  EXPECT_EQ(video->SequenceTimeToClipTime(4 * kSecond), 5 * kSecond);
-  EXPECT_EQ(video->ClipTimeToSequenceTime(5 * kSecond), 4 * kSecond);
+  EXPECT_EQ(video->SequenceTimeToClipTime(SequenceTime(4 * kSecond)).Ticks(), 5 * kSecond);
+  EXPECT_EQ(video->ClipTimeToSequenceTime(ClipTime(5 * kSecond)).Ticks(), 4 * kSecond);
   EXPECT_FALSE(video->SetSpeed(0.0));
   EXPECT_FALSE(video->SetSpeed(-1.0));
   EXPECT_EQ(video->GetSpeed(), 2.0);

@@ -18,7 +18,7 @@ class AngleParameterTest : public RowsTest {
                                             ->SetPrecision(1));
 
   double AngleAt(TickTime sequenceTime) {
-    return *rotation->GetScalarAt(clip->SequenceTimeToClipTime(sequenceTime));
+    return *rotation->GetScalarAt(clip->SequenceTimeToClipTime(SequenceTime(sequenceTime)).Ticks());
   }
 };
 

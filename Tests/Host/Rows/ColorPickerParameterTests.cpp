@@ -22,7 +22,8 @@ class ColorPickerParameterTest : public RowsTest {
   ~ColorPickerParameterTest() override { InputBox::SetResponder(nullptr); }
 
   ParamColor ColorAt(TickTime sequenceTime) {
-    return std::get<ParamColor>(tint->GetValueAt(clip->SequenceTimeToClipTime(sequenceTime)));
+    return std::get<ParamColor>(
+        tint->GetValueAt(clip->SequenceTimeToClipTime(SequenceTime(sequenceTime)).Ticks()));
   }
   void Pick(ColorPickerParameter& row, std::string answer) {
     answers->PushAnswer(std::move(answer));

@@ -24,7 +24,8 @@ class MenuParameterTest : public RowsTest {
   ~MenuParameterTest() override { SetMenuTracker(nullptr); }
 
   int ChoiceAt(TickTime sequenceTime) {
-    return std::get<ParamChoice>(blend->GetValueAt(clip->SequenceTimeToClipTime(sequenceTime)))
+    return std::get<ParamChoice>(
+               blend->GetValueAt(clip->SequenceTimeToClipTime(SequenceTime(sequenceTime)).Ticks()))
         .index;
   }
   // Opens the row's popup with a click and answers with item `index` (nullopt: dismiss).

@@ -32,7 +32,7 @@ class ParameterControlTest : public RowsTest {
       ComponentParam::Create("Opacity", ParamType::FloatSlider, 100.0)->SetRange(0.0, 100.0));
 
   double ValueAt(TickTime sequenceTime) {
-    return *opacity->GetScalarAt(clip->SequenceTimeToClipTime(sequenceTime));
+    return *opacity->GetScalarAt(clip->SequenceTimeToClipTime(SequenceTime(sequenceTime)).Ticks());
   }
   static Point CenterOf(const ViewBase& view) { return view.GetBounds().Center(); }
 };
@@ -41,7 +41,7 @@ TEST_F(ParameterControlTest, EditTimeIsConvertedToClipTimeThroughTheTrackItem) {
   auto row = MakeRow<PlainRow>(opacity);
   EXPECT_EQ(row->GetEditTime(), 12 * kSecond);
   EXPECT_EQ(row->GetClipEditTime(), 7 * kSecond);
-  EXPECT_EQ(row->ClipTimeToSequenceTime(7 * kSecond), 12 * kSecond);
+  EXPECT_EQ(row->ClipTimeToSequenceTime(ClipTime(7 * kSecond)).Ticks(), 12 * kSecond);
   EXPECT_EQ(row->GetName(), "Opacity");
 }
 

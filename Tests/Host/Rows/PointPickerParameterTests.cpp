@@ -22,7 +22,8 @@ class PointPickerTest : public RowsTest {
                    ->SetPrecision(1));
 
   ParamPoint PointAt(TickTime sequenceTime) {
-    return std::get<ParamPoint>(position->GetValueAt(clip->SequenceTimeToClipTime(sequenceTime)));
+    return std::get<ParamPoint>(
+        position->GetValueAt(clip->SequenceTimeToClipTime(SequenceTime(sequenceTime)).Ticks()));
   }
 
   void TypeInto(HotFloatControl& field, const std::string& text) {

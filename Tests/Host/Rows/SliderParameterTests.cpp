@@ -25,7 +25,7 @@ class SliderRowsTest : public RowsTest {
                    ->SetUnits(ParamUnits::Percent));
 
   double ValueAt(const ComponentParamRef& param, TickTime sequenceTime) {
-    return *param->GetScalarAt(clip->SequenceTimeToClipTime(sequenceTime));
+    return *param->GetScalarAt(clip->SequenceTimeToClipTime(SequenceTime(sequenceTime)).Ticks());
   }
 
   template <class Row>
