@@ -343,22 +343,22 @@ void EffectControlsHandler::ListenToMessage(const Message& message) {
     return;
   }
   if (message.Is<PenToolSelectedMessage>()) {
-    SetToolMode(kToolModePen);
+    SetToolMode(ToolMode::kPen);
   } else if (message.Is<HandToolSelectedMessage>()) {
-    SetToolMode(kToolModeHand);
+    SetToolMode(ToolMode::kHand);
   } else if (message.Is<ZoomToolSelectedMessage>()) {
-    SetToolMode(kToolModeZoom);
+    SetToolMode(ToolMode::kZoom);
   } else if (message.Is<PointerToolSelectedMessage>() ||
              message.Is<TrackSelectForwardToolSelectedMessage>() ||
              message.Is<RippleToolSelectedMessage>() || message.Is<RollToolSelectedMessage>() ||
              message.Is<RateStretchToolSelectedMessage>() ||
              message.Is<RazorToolSelectedMessage>() || message.Is<SlipToolSelectedMessage>() ||
              message.Is<SlideToolSelectedMessage>()) {
-    SetToolMode(kToolModePointer);
+    SetToolMode(ToolMode::kPointer);
   }
 }
 
-void EffectControlsHandler::SetToolMode(int mode) {
+void EffectControlsHandler::SetToolMode(ToolMode mode) {
   mToolMode = mode;
   if (mView) {
     mView->SetToolMode(mode);

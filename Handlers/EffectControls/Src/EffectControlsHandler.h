@@ -5,6 +5,7 @@
 #include <string>
 #include <string_view>
 
+#include "Handlers/EffectControls/Src/ToolMode.h"
 #include "Host/Messaging/Listener.h"
 #include "Host/Shell/Handler.h"
 #include "Host/Toolkit/Decals.h"
@@ -28,12 +29,6 @@ class EffectControlsHandler : public Handler, public Listener {
   static constexpr std::string_view kColorSetName = "effectcontrolscolors";
   static constexpr std::string_view kFlyoutMenuName = "HandlerEffectControls_Flyout_Menu";
   static constexpr CommandID kKeyRepeatsDisabledCommand = 12052;
-
-  // Tool modes shared with the view and the keyframe area.
-  static constexpr int kToolModePointer = 100;
-  static constexpr int kToolModeZoom = 200;
-  static constexpr int kToolModeHand = 300;
-  static constexpr int kToolModePen = 400;
 
   // The keyframe images, in image-list order: 6 x kind + variant, then time remapping.
   static constexpr int kKeyframeImageCount = 48;
@@ -65,18 +60,18 @@ class EffectControlsHandler : public Handler, public Listener {
   // Tool changes and opened track-item selections (a transition brings the tab to the front).
   void ListenToMessage(const Message& message) override;
 
-  int GetToolMode() const { return mToolMode; }
+  ToolMode GetToolMode() const { return mToolMode; }
   // The panel's view; null before the host asked for it and after its tab was destroyed.
   EffectControlsView* GetView() const;
   // The images every keyframe track draws from (also handed to the rows).
   const std::shared_ptr<const ImageList>& GetKeyframeImageList() const { return mKeyframeImages; }
 
  private:
-  void SetToolMode(int mode);
+  void SetToolMode(ToolMode mode);
   // Drops a view whose tab the host destroyed (a closed tab).
   void ForgetDestroyedView();
 
-  int mToolMode = kToolModePointer;
+  ToolMode mToolMode = ToolMode::kPointer;
   std::shared_ptr<EffectControlsView> mView;  // shared with the workspace frame
   std::shared_ptr<const ImageList> mKeyframeImages;
   bool mWindowClassAdded = false;

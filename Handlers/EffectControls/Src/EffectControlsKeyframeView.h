@@ -3,6 +3,7 @@
 #include <memory>
 #include <string_view>
 
+#include "Handlers/EffectControls/Src/ToolMode.h"
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Message.h"
 #include "Host/Model/ModelRefs.h"
@@ -41,8 +42,8 @@ class EffectControlsKeyframeView : public SubView, public Listener {
   // The keyframe glyphs (6 x kind + variant); null draws plain diamonds.
   void SetKeyframeImages(std::shared_ptr<const ImageList> images) { mImages = std::move(images); }
 
-  void SetToolMode(int mode) { mToolMode = mode; }
-  int GetToolMode() const { return mToolMode; }
+  void SetToolMode(ToolMode mode) { mToolMode = mode; }
+  ToolMode GetToolMode() const { return mToolMode; }
   void SetPinToClip(bool pinned);
   bool IsPinnedToClip() const { return mPinned; }
   void SetKeyframesVisible(bool visible) { mKeyframesVisible = visible; }
@@ -99,7 +100,7 @@ class EffectControlsKeyframeView : public SubView, public Listener {
   std::weak_ptr<EffectControlsListView> mList;
   std::shared_ptr<const PanelTimeline> mTimeline;
   std::shared_ptr<const ImageList> mImages;
-  int mToolMode = 100;
+  ToolMode mToolMode = ToolMode::kPointer;
   bool mPinned = true;
   bool mKeyframesVisible = true;
   bool mDraggingSeparator = false;

@@ -96,7 +96,7 @@ std::string EffectControlsView::GetFlyoutMenuName() const {
   return "HandlerEffectControls_Flyout_Menu";
 }
 
-void EffectControlsView::SetToolMode(int mode) {
+void EffectControlsView::SetToolMode(ToolMode mode) {
   mToolMode = mode;
   mKeyframeView->SetToolMode(mode);
 }

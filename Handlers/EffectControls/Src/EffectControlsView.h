@@ -8,6 +8,7 @@
 #include "Handlers/EffectControls/Public/EffectControlsListScroller.h"
 #include "Handlers/EffectControls/Src/ECWZoomLimiter.h"
 #include "Handlers/EffectControls/Src/SequenceMarkers.h"
+#include "Handlers/EffectControls/Src/ToolMode.h"
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Message.h"
 #include "Host/Messaging/Station.h"
@@ -138,7 +139,7 @@ class EffectControlsView : public TabView,
   ~EffectControlsView() override;
 
   // --- Used by the handler ---
-  void SetToolMode(int mode);
+  void SetToolMode(ToolMode mode);
   std::string GetName() const;
   // Follows `sequence` (null: none) and refreshes the target from its clip selection.
   void OnSequenceActivated(const SequenceRef& sequence);
@@ -336,5 +337,5 @@ class EffectControlsView : public TabView,
   bool mSequenceChangedOffDuty = false;
   bool mAudioTimeUnits = false;
   bool mLayingOut = false;
-  int mToolMode = 100;
+  ToolMode mToolMode = ToolMode::kPointer;
 };

@@ -212,7 +212,7 @@ TEST_F(EffectControlsHandlerTest, RegistersStationsColoursMenusWindowAndWindowMe
   EXPECT_EQ(EffectControlsHandler::GetInstance(), handler);
   EXPECT_EQ(handler->GetContextName(), "effectcontrols");
   EXPECT_TRUE(handler->IsSingleInstance());
-  EXPECT_EQ(handler->GetToolMode(), 100);
+  EXPECT_EQ(handler->GetToolMode(), ToolMode::kPointer);
   EXPECT_TRUE(StationExists("EffectControls.Reset"));
   EXPECT_TRUE(StationExists("ECW.audio.player.relay"));
 
@@ -323,28 +323,29 @@ TEST_F(EffectControlsHandlerTest, ToolMessagesBeforeTheViewOnlyStoreTheMode) {
   EffectControlsHandler* handler = MakeHandler();
   ASSERT_NE(handler, nullptr);
   app->SelectTool(HostTool::kPen);
-  EXPECT_EQ(handler->GetToolMode(), 400);
+  EXPECT_EQ(handler->GetToolMode(), ToolMode::kPen);
   app->SelectTool(HostTool::kHand);
-  EXPECT_EQ(handler->GetToolMode(), 300);
+  EXPECT_EQ(handler->GetToolMode(), ToolMode::kHand);
   EXPECT_EQ(handler->GetView(), nullptr);
   app->OpenTab(kEffectControlsHandlerID);
   ASSERT_NE(handler->GetView(), nullptr);
-  EXPECT_EQ(handler->GetView()->GetKeyframeView()->GetToolMode(), 300);
+  EXPECT_EQ(handler->GetView()->GetKeyframeView()->GetToolMode(), ToolMode::kHand);
 }
 
 TEST_F(EffectControlsHandlerTest, EveryTimelineToolMapsToAMode) {
   EffectControlsHandler* handler = MakeHandler();
   ASSERT_NE(handler, nullptr);
   app->OpenTab(kEffectControlsHandlerID);
-  const std::vector<std::pair<HostTool, int>> tools = {
-      {HostTool::kZoom, 200}, {HostTool::kTrackSelectForward, 100},
-      {HostTool::kPen, 400},  {HostTool::kRipple, 100},
-      {HostTool::kHand, 300}, {HostTool::kRoll, 100},
-      {HostTool::kZoom, 200}, {HostTool::kRateStretch, 100},
-      {HostTool::kZoom, 200}, {HostTool::kRazor, 100},
-      {HostTool::kZoom, 200}, {HostTool::kSlip, 100},
-      {HostTool::kZoom, 200}, {HostTool::kSlide, 100},
-      {HostTool::kZoom, 200}, {HostTool::kPointer, 100},
+  constexpr ToolMode kPointer = ToolMode::kPointer;
+  const std::vector<std::pair<HostTool, ToolMode>> tools = {
+      {HostTool::kZoom, ToolMode::kZoom}, {HostTool::kTrackSelectForward, kPointer},
+      {HostTool::kPen, ToolMode::kPen},   {HostTool::kRipple, kPointer},
+      {HostTool::kHand, ToolMode::kHand}, {HostTool::kRoll, kPointer},
+      {HostTool::kZoom, ToolMode::kZoom}, {HostTool::kRateStretch, kPointer},
+      {HostTool::kZoom, ToolMode::kZoom}, {HostTool::kRazor, kPointer},
+      {HostTool::kZoom, ToolMode::kZoom}, {HostTool::kSlip, kPointer},
+      {HostTool::kZoom, ToolMode::kZoom}, {HostTool::kSlide, kPointer},
+      {HostTool::kZoom, ToolMode::kZoom}, {HostTool::kPointer, kPointer},
   };
   for (const auto& [tool, mode] : tools) {
     app->SelectTool(tool);
@@ -392,7 +393,7 @@ TEST_F(EffectControlsHandlerTest, AClosedTabIsNoLongerTheHandlersView) {
   EXPECT_EQ(handler->GetView(), nullptr);
   app->SelectTool(HostTool::kZoom);  // reaches no destroyed view
   app->OpenTrackItemSelection({});
-  EXPECT_EQ(handler->GetToolMode(), 200);
+  EXPECT_EQ(handler->GetToolMode(), ToolMode::kZoom);
 }
 
 }  // namespace
