@@ -62,6 +62,16 @@ std::vector<ComponentRef> ComponentChain::ApplicableEffects(
   return applicable;
 }
 
+std::vector<ComponentRef> ComponentChain::WithCopiesInserted(
+    const std::vector<ComponentRef>& effects, int index) const {
+  std::vector<ComponentRef> after = mComponents;
+  auto at = after.begin() + std::clamp(index, 0, GetCount());
+  for (const ComponentRef& effect : effects) {
+    at = after.insert(at, effect->Clone()) + 1;
+  }
+  return after;
+}
+
 void ComponentChain::SetComponents(std::vector<ComponentRef> components) {
   std::set<const Component*> seen;
   for (const ComponentRef& component : components) {

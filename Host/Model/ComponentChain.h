@@ -34,6 +34,10 @@ class ComponentChain : public ModelObject {
   // Of `effects`, those a user may apply to this chain, in order: effects (not intrinsics, not
   // masks) of the chain's media type.
   std::vector<ComponentRef> ApplicableEffects(const std::vector<ComponentRef>& effects) const;
+  // This chain's list with copies (Component::Clone) of `effects` before position `index`
+  // (clamped to the list): what an action applying them sets. The chain is not changed.
+  std::vector<ComponentRef> WithCopiesInserted(const std::vector<ComponentRef>& effects,
+                                               int index) const;
 
   // Replaces the whole list: components that leave lose their chain, those that arrive leave the
   // chain they were in (without a message there: callers that move between chains set both) and

@@ -38,13 +38,8 @@ EditStatus MasterClipEffects::InsertEffects(const MasterClipRef& clip,
   if (applicable.empty()) {
     return EditStatus::InvalidArgument;
   }
-  std::vector<ComponentRef> after = chain->GetComponents();
   index = std::clamp(index, 0, chain->GetCount());
-  std::vector<ComponentRef> copies;
-  for (const ComponentRef& effect : applicable) {
-    copies.push_back(effect->Clone());
-  }
-  after.insert(after.begin() + index, copies.begin(), copies.end());
+  std::vector<ComponentRef> after = chain->WithCopiesInserted(applicable, index);
   const char* name =
       index == static_cast<int>(chain->GetComponents().size()) ? kApplyEffects : kInsertEffects;
   return ExecuteModelAction(clip->GetProject(), ComponentChainActions::CreateSetComponentsAction(

@@ -48,13 +48,7 @@ EditStatus InsertEffects(const TrackItemRef& item, const std::vector<ComponentRe
     return EditStatus::InvalidArgument;
   }
   const ComponentChainRef& chain = item->GetComponentChain();
-  std::vector<ComponentRef> after = chain->GetComponents();
-  index = std::clamp(index, 0, chain->GetCount());
-  std::vector<ComponentRef> copies;
-  for (const ComponentRef& effect : applicable) {
-    copies.push_back(effect->Clone());
-  }
-  after.insert(after.begin() + index, copies.begin(), copies.end());
+  std::vector<ComponentRef> after = chain->WithCopiesInserted(applicable, index);
   return ExecuteModelAction(item->GetProject(), ComponentChainActions::CreateSetComponentsAction(
                                                     chain, name, std::move(after)));
 }
