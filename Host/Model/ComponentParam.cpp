@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <utility>
+#include <variant>
 
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/Component.h"
@@ -330,4 +331,20 @@ void ComponentParam::NotifyChanged() {
       chain->NotifyValuesChanged();
     }
   }
+}
+
+std::size_t ComponentParam::CountGroupEntries() const {
+  const ParamValue value = GetValueAt(kTime_Zero);
+  if (const auto* text = std::get_if<std::string>(&value)) {
+    return static_cast<std::size_t>(std::count(text->begin(), text->end(), ';'));
+  }
+  if (const auto* blob = std::get_if<ParamBlob>(&value)) {
+    // A trailing odd byte is no code unit.
+    std::size_t count = 0;
+    for (std::size_t i = 0; i + 1 < blob->bytes.size(); i += 2) {
+      count += blob->bytes[i] == ';' && blob->bytes[i + 1] == 0 ? 1 : 0;
+    }
+    return count;
+  }
+  return 0;
 }

@@ -101,6 +101,9 @@ class ComponentParam : public ModelObject {
   ParamValue GetValueAt(TickTime clipTime) const;
   // The scalar reading (AsScalar) of GetValueAt; nullopt for non-scalar kinds.
   std::optional<double> GetScalarAt(TickTime clipTime) const;
+  // The number of parameters a counted group spans: the semicolons in its value at time zero,
+  // read as text (a string, or binary data holding UTF-16 text, low byte first).
+  std::size_t CountGroupEntries() const;
   const KeyframeCurve& GetKeyframes() const { return mState.keyframes; }
   bool HasKeyframes() const { return !mState.keyframes.IsEmpty(); }
   // Keyframe times in [first, last].

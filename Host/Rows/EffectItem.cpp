@@ -221,10 +221,10 @@ void EffectItem::DrawTitle(DC& dc, const Rect& rect, const Font& font, Color col
 
 void EffectItem::PaintSelf(DC& /*dc*/, const Rect& /*rowRect*/) {}
 
-void EffectItem::GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const {
+void EffectItem::GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const {
   for (const auto& child : mItems) {
     if (!child->IsSetAside()) {
-      child->GetKeyframeTimes(times, toSequenceTime);
+      child->GetKeyframeTimes(times, line);
     }
   }
 }

@@ -10,6 +10,7 @@
 #include "Host/Messaging/Message.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Time/TickTime.h"
+#include "Host/Time/TimePoint.h"
 #include "Host/Toolkit/Color.h"
 #include "Host/Toolkit/Geometry.h"
 
@@ -188,8 +189,8 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
 
   // --- Keyframes ---
   // Adds the keyframe times of the row (the base: of its children that are not set aside) to
-  // `times`, in sequence time when `toSequenceTime`, else in clip time.
-  virtual void GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const;
+  // `times`, on the given time line.
+  virtual void GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const;
 
   // --- Model follow-up (recursive helpers the list calls) ---
   // Re-reads from the model whether parameter rows are set aside; true when any changed.

@@ -26,7 +26,7 @@ class GroupBeginParameter : public ParameterControl {
   bool CanTimeVary() const override { return false; }
   int OwnHeight() const override { return kParameterRowHeight; }
   // The children's keyframes (the group parameter itself has none).
-  void GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const override;
+  void GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const override;
   // Records the state in the component (unless the property is read only, in which case the
   // component's property station is warned) and shows or hides the children.
   void SetIsExpanded(bool expanded) override;
@@ -42,8 +42,4 @@ class GroupBeginParameter : public ParameterControl {
 
   // The key under which the group's expanded state is kept in its component.
   std::string GetExpandedPropertyKey() const;
-
-  // The number of parameters a counted group (kind 24) spans: the semicolons in its value at
-  // time zero, read as text (a string, or binary data holding UTF-16 text, low byte first).
-  static std::size_t CountGroupEntries(const ComponentParam& param);
 };

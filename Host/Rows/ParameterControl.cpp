@@ -157,12 +157,13 @@ void ParameterControl::PositionSelf(int top, int depth, int width) {
   }
 }
 
-void ParameterControl::GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const {
+void ParameterControl::GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const {
   if (!mParam) {
     return;
   }
   for (const TickTime time : mParam->GetKeyframeTimes()) {
-    times.insert(toSequenceTime ? ClipTimeToSequenceTime(ClipTime(time)).Ticks() : time);
+    times.insert(line == TimeLine::kSequence ? ClipTimeToSequenceTime(ClipTime(time)).Ticks()
+                                             : time);
   }
 }
 

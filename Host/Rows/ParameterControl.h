@@ -105,7 +105,7 @@ class ParameterControl : public EffectItem, public Commander {
   int GetExpandedAreaHeight() const override;
   void PositionSelf(int top, int depth, int width) override;
   // The parameter's keyframe times (see the base).
-  void GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const override;
+  void GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const override;
   // Where a row's value controls start: the parameter indent + half the width - 20.
   virtual int GetControlsLeft() const;
   // The name ends where the controls start.

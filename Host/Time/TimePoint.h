@@ -36,3 +36,6 @@ class TimePoint {
 using ClipTime = TimePoint<struct ClipTimeLine>;
 // The sequence's time line: where clips are placed and the edit line moves.
 using SequenceTime = TimePoint<struct SequenceTimeLine>;
+
+// Which of the two lines a bare TickTime answer is given on.
+enum class TimeLine { kClip, kSequence };

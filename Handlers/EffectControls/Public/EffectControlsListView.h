@@ -19,6 +19,7 @@
 #include "Host/Shell/PanelStateDump.h"
 #include "Host/Time/FrameRate.h"
 #include "Host/Time/TickTime.h"
+#include "Host/Time/TimePoint.h"
 #include "Host/Toolkit/Font.h"
 #include "Host/Toolkit/ImageList.h"
 #include "Host/Toolkit/KeyModifiers.h"
@@ -142,6 +143,8 @@ class EffectControlsListView : public SubView, public Listener {
   // What the next build shows, and what the rows were built for (none since the last clear).
   const PanelTarget& GetTarget() const { return mTarget; }
   const std::optional<PanelTarget>& GetBuiltTarget() const { return mBuiltTarget; }
+  // What `groups` (the sequence's clip selection) asks the list to show.
+  PanelTarget ChooseTarget(std::vector<TrackItemGroup> groups) const;
   // The effects of the master clip's chain are read only, or the sequence is.
   bool IsReadOnlyEffectContainer() const;
 
@@ -201,10 +204,9 @@ class EffectControlsListView : public SubView, public Listener {
   const TrackItemRef& GetAudioTransitionItem() const { return mAudioTransitionItem; }
   const ComponentChainRef& GetVideoChain() const { return mVideoChain; }
   const ComponentChainRef& GetMasterGraphicChain() const { return mMasterGraphicChain; }
-  // The shown item's start and media-in: what the keyframe area converts sequence time to clip
-  // time with. Zero when nothing is shown.
-  TickTime GetTrackItemStartTime() const { return mTrackItemStart; }
-  TickTime GetTrackItemMediaInTime() const { return mTrackItemMediaIn; }
+  // Converts through the shown video item, else the shown audio transition (the item ResetTimes
+  // chose); with neither, the two lines coincide.
+  SequenceTime ClipTimeToSequenceTime(ClipTime clipTime) const;
   void ResetTimes();
 
   // --- Stations ---
@@ -328,8 +330,6 @@ class EffectControlsListView : public SubView, public Listener {
   void SyncRowsToTime(bool force);
   void StopListeningTo(const StationName& station);
   void NewKeyframeSelection();
-  // What `groups` (the sequence's clip selection) asks the list to show.
-  PanelTarget ChooseTarget(std::vector<TrackItemGroup> groups) const;
   void FinishAndShowRows(const EffectItemList& list);
   // The one layout walk behind PositionItems and GetMaxHeight: section headers and top rows
   // from the top of the content down; `sink` (null: only measure) receives the placements.
@@ -383,8 +383,8 @@ class EffectControlsListView : public SubView, public Listener {
   std::shared_ptr<KeyframeMultiSelection> mKeyframeSelection;
   // Shared with the panel view, which owns it, and (its edit time) with the rows.
   std::shared_ptr<PanelTimeline> mTimeline;
-  TickTime mTrackItemStart = 0;
-  TickTime mTrackItemMediaIn = 0;
+  // The item whose placement relates the rows' clip times to the sequence (see ResetTimes).
+  TrackItemRef mTimeReferenceItem;
   int mScrollOffset = 0;
   ImageList mImageList;
   Font mNormalFont;

@@ -26,8 +26,6 @@
 
 namespace {
 
-constexpr double kTicksPerSecondD = 254016000000.0;
-
 struct SnapPreference {
   unsigned flag;
   std::string_view key;
@@ -147,16 +145,11 @@ double EffectControlsKeyframeView::GetSecondsPerPixel() const {
 }
 
 double EffectControlsKeyframeView::TimeToX(TickTime time) const {
-  const double secondsPerPixel = GetSecondsPerPixel();
-  if (!(secondsPerPixel > 0.0)) {
-    return 0.0;
-  }
-  return static_cast<double>(time - GetVisibleStartTime()) / (secondsPerPixel * kTicksPerSecondD);
+  return mTimeline ? mTimeline->TimeToX(time) : 0.0;
 }
 
 TickTime EffectControlsKeyframeView::XToTime(double x) const {
-  return GetVisibleStartTime() +
-         static_cast<TickTime>(std::llround(x * GetSecondsPerPixel() * kTicksPerSecondD));
+  return mTimeline ? mTimeline->XToTime(x) : 0;
 }
 
 int EffectControlsKeyframeView::GetSelectedKeyframeCount() const {
@@ -194,8 +187,6 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
     dc.FillRect(Rect{clipLeft, 0, clipRight, bounds.Height()}, background);
   }
 
-  const TickTime trackStart = list->GetTrackItemStartTime();
-  const TickTime mediaIn = list->GetTrackItemMediaInTime();
   const auto selection = list->GetKeyframeSelection();
   const auto draw = [&](const std::shared_ptr<EffectItem>& row) {
     if (!row->IsShown() || row->IsSetAside()) {
@@ -224,9 +215,10 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
     const auto& keys = control->GetParam()->GetKeyframes().Keyframes();
     const int centreY = top + row->OwnHeight() / 2;
     for (std::size_t i = 0; i < keys.size(); ++i) {
-      const TickTime sequenceTime =
-          control->GetTrackItem() ? control->ClipTimeToSequenceTime(ClipTime(keys[i].time)).Ticks()
-                                  : keys[i].time - mediaIn + trackStart;
+      const ClipTime clipTime(keys[i].time);
+      const TickTime sequenceTime = control->GetTrackItem()
+                                        ? control->ClipTimeToSequenceTime(clipTime).Ticks()
+                                        : list->ClipTimeToSequenceTime(clipTime).Ticks();
       const int x = static_cast<int>(std::lround(TimeToX(sequenceTime)));
       if (x < -8 || x > bounds.Width() + 8) {
         continue;

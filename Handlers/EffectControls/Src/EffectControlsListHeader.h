@@ -55,7 +55,7 @@ class EffectControlsListHeader : public SubView {
   bool AreKeyframesVisible() const { return mKeyframesVisible; }
   void EnableExpander(bool enable);
 
-  int GetDisplayMode() const { return mDisplayMode; }
+  DisplayMode GetDisplayMode() const { return mDisplayMode; }
   bool HasSeveralClips() const { return mSeveralClips; }
   bool IsShowingMasterClip() const { return mShowingMasterClip; }
   // The text the header shows, as one line (the two groups joined by two spaces in clip mode).
@@ -105,7 +105,7 @@ class EffectControlsListHeader : public SubView {
   TrackItemRef mOutgoing;
   TrackItemRef mIncoming;
   std::shared_ptr<MultiPictureButton> mExpander;
-  int mDisplayMode = kModeNone;
+  DisplayMode mDisplayMode = kModeNone;
   bool mShowingMasterClip = false;
   bool mBusy = false;
   std::string mNoTargetText;

@@ -144,9 +144,12 @@ void EffectControlsListView::RebuildClipOrTransitionView() {
 }
 
 void EffectControlsListView::ResetTimes() {
-  const TrackItemRef& item = mVideoTrackItem ? mVideoTrackItem : mAudioTransitionItem;
-  mTrackItemStart = item ? item->GetStart() : 0;
-  mTrackItemMediaIn = item ? item->GetMediaIn() : 0;
+  mTimeReferenceItem = mVideoTrackItem ? mVideoTrackItem : mAudioTransitionItem;
+}
+
+SequenceTime EffectControlsListView::ClipTimeToSequenceTime(ClipTime clipTime) const {
+  return mTimeReferenceItem ? mTimeReferenceItem->ClipTimeToSequenceTime(clipTime)
+                            : SequenceTime(clipTime.Ticks());
 }
 
 void EffectControlsListView::NewKeyframeSelection() {

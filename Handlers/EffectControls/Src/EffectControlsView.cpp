@@ -60,7 +60,6 @@ EffectControlsView::EffectControlsView(Commander* parent, std::string contextNam
   mHeader->SetMasterClipHandler([this](const MasterClipRef& clip) { TargetMasterClip(clip); });
   mHeader->SetSequenceHandler([this]() {
     SetMasterClip(nullptr);
-    mSelectedGroups.clear();
     mTargetMode = kTargetNone;
     if (mSequence) {
       SequenceClipSelectionChanged(mSequence);
@@ -178,50 +177,58 @@ void EffectControlsView::SetBoundsSelf(const Rect& /*bounds*/) {
   LayoutPanel();
 }
 
+int EffectControlsView::ListWidthFor(int panelWidth) const {
+  return std::max(kMinListWidth,
+                  static_cast<int>(std::lround(static_cast<float>(panelWidth) * CurrentRatio())));
+}
+
 void EffectControlsView::LayoutPanel() {
   if (mLayingOut) {
     return;
   }
   mLayingOut = true;
-  const int W = GetBounds().Width();
-  const int H = GetBounds().Height();
-  const int S = GetScrollBarWidth();
-  const int R = ScrollBar::GetDefaultScrollBarSize();
-  const int T = kRulerHeight;
-
-  const int L = std::max(kMinListWidth,
-                         static_cast<int>(std::lround(static_cast<float>(W) * CurrentRatio())));
-  const int K = std::max(1, W - S - L - kSeparatorGap);
-  const int rulerWidth = std::max(0, W - S - L - kSeparatorGap);
+  const int width = GetBounds().Width();
+  const int height = GetBounds().Height();
+  const int scrollBarWidth = GetScrollBarWidth();
+  // The keyframe area keeps room for its horizontal scroll bar even when stacked.
+  const int hScrollBarHeight = ScrollBar::GetDefaultScrollBarSize();
+  const int listWidth = ListWidthFor(width);
+  const int keyframeWidth = width - scrollBarWidth - listWidth - kSeparatorGap;
+  const int rulerWidth = std::max(0, keyframeWidth);
   if (mKeyframesVisible) {
-    mZoomLimiter.SetScrollWidth(K);
-    mRulerHolder->SetBounds(Rect::FromSize(L, 0, rulerWidth, T));
+    mZoomLimiter.SetScrollWidth(std::max(1, keyframeWidth));
+    mRulerHolder->SetBounds(Rect::FromSize(listWidth, 0, rulerWidth, kRulerHeight));
     mZoomBar->SetBounds(Rect::FromSize(0, 0, rulerWidth, kZoomBarHeight));
-    mRuler->SetBounds(Rect::FromSize(0, kZoomBarHeight, rulerWidth, T - kZoomBarHeight));
+    mRuler->SetBounds(Rect::FromSize(0, kZoomBarHeight, rulerWidth, kRulerBarHeight));
   }
-  const int headerWidth = mKeyframesVisible ? (L <= W - S ? L : W) : W - 4;
-  mHeader->SetBounds(Rect::FromSize(0, 0, std::max(0, headerWidth), T));
-  const int A = mKeyframesVisible ? std::min(L, W - S) : W - 4 - S;
+  const int headerWidth =
+      mKeyframesVisible ? (listWidth <= width - scrollBarWidth ? listWidth : width) : width - 4;
+  mHeader->SetBounds(Rect::FromSize(0, 0, std::max(0, headerWidth), kRulerHeight));
+  const int listRight =
+      mKeyframesVisible ? std::min(listWidth, width - scrollBarWidth) : width - 4 - scrollBarWidth;
+  const int belowRuler = height - kRulerHeight - kBottomBarHeight;
   mListView->SetBounds(
-      Rect::FromSize(5, T, std::max(0, A - 5), std::max(0, H - T - kBottomBarHeight)));
-  mKeyframeView->SetBounds(
-      Rect::FromSize(L, T, rulerWidth, std::max(0, H - T - R - kBottomBarHeight)));
+      Rect::FromSize(5, kRulerHeight, std::max(0, listRight - 5), std::max(0, belowRuler)));
+  mKeyframeView->SetBounds(Rect::FromSize(listWidth, kRulerHeight, rulerWidth,
+                                          std::max(0, belowRuler - hScrollBarHeight)));
   mKeyframeAreaWidth = rulerWidth;
   if (mTimecode) {
-    mTimecode->SetBounds(Rect::FromSize(5, H - 19, 105, 20));
+    mTimecode->SetBounds(Rect::FromSize(5, height - 19, 105, 20));
   }
   if (mPlayButton) {
-    mPlayButton->SetBounds(Rect::FromSize(W - 67, H - 18, 25, 18));
-    mLoopButton->SetBounds(Rect::FromSize(W - 40, H - 18, 25, 18));
+    mPlayButton->SetBounds(Rect::FromSize(width - 67, height - 18, 25, 18));
+    mLoopButton->SetBounds(Rect::FromSize(width - 40, height - 18, 25, 18));
   }
-  mScrollBar->SetBounds(Rect::FromSize(W - S, T, S, std::max(0, H - T - kBottomBarHeight)));
+  mScrollBar->SetBounds(Rect::FromSize(width - scrollBarWidth, kRulerHeight, scrollBarWidth,
+                                       std::max(0, belowRuler)));
   mScrollBar->SetVisible(!IsStacked());
   mLayingOut = false;
 
-  if (mKeyframesVisible && K > 0) {
+  if (mKeyframesVisible) {
     const TickTime span = mRuler->GetZoomOutTime() - mRuler->GetZoomInTime();
     if (span > 0) {
-      ZoomToTimePerPixel(static_cast<double>(span) / kTicksPerSecond / K, false);
+      ZoomToTimePerPixel(static_cast<double>(span) / kTicksPerSecond / std::max(1, keyframeWidth),
+                         false);
     }
   }
   mListView->UpdateVScrollBar();
@@ -237,17 +244,14 @@ int EffectControlsView::GetMaxStackedHeight() const {
 }
 
 void EffectControlsView::OnSeparatorMoved(int listWidth) {
-  const int W = GetBounds().Width();
-  const int S = GetScrollBarWidth();
-  if (W < S + kMinListWidth + kMinKeyframeWidth) {
+  const int width = GetBounds().Width();
+  const int scrollBarWidth = GetScrollBarWidth();
+  if (width < scrollBarWidth + kMinListWidth + kMinKeyframeWidth) {
     return;
   }
-  int X = listWidth;
-  if (W - X - S < kMinKeyframeWidth) {
-    X = W - S - kMinKeyframeWidth;
-  }
-  X = std::max(X, kMinListWidth);
-  StoreRatio(static_cast<float>(X) / static_cast<float>(W));
+  const int widest = width - scrollBarWidth - kMinKeyframeWidth;
+  const int kept = std::max(std::min(listWidth, widest), kMinListWidth);
+  StoreRatio(static_cast<float>(kept) / static_cast<float>(width));
   LayoutPanel();
 }
 
@@ -271,14 +275,12 @@ void EffectControlsView::SetKeyframesVisible(bool visible) {
 void EffectControlsView::ToggleKeyframesVisible() {
   mKeyframesVisible = !mKeyframesVisible;
   ApplyKeyframesVisible();
-  const int W = GetBounds().Width();
-  if (mKeyframesVisible && W > 0) {
-    const int S = GetScrollBarWidth();
-    const int L = std::max(kMinListWidth,
-                           static_cast<int>(std::lround(static_cast<float>(W) * CurrentRatio())));
-    if (W - S - L - kSeparatorGap < kMinKeyframeWidth) {
-      StoreRatio(static_cast<float>(std::max(kMinListWidth, W - S - kMinKeyframeWidth)) /
-                 static_cast<float>(W));
+  const int width = GetBounds().Width();
+  if (mKeyframesVisible && width > 0) {
+    const int scrollBarWidth = GetScrollBarWidth();
+    if (width - scrollBarWidth - ListWidthFor(width) - kSeparatorGap < kMinKeyframeWidth) {
+      const int widest = std::max(kMinListWidth, width - scrollBarWidth - kMinKeyframeWidth);
+      StoreRatio(static_cast<float>(widest) / static_cast<float>(width));
     }
   }
   LayoutPanel();

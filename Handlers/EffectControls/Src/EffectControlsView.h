@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -55,6 +56,8 @@ class EffectControlsView : public TabView,
                            public StateDumpSource {
  public:
   enum TargetMode : int { kTargetNone = 0, kTargetClip = 1, kTargetTransition = 2 };
+  // Work the view posts to itself (see Defer).
+  enum class DeferredWork { kReloadMarkers, kInvalidate, kMoveMarker, kEditMarker };
 
   static constexpr int kMinListWidth = 263;
   static constexpr int kMinKeyframeWidth = 74;
@@ -191,12 +194,11 @@ class EffectControlsView : public TabView,
   float GetSeparatorRatio() const { return mSeparatorRatio; }
   float GetSeparatorRatioWhenMaximized() const { return mSeparatorRatioMaximized; }
   int GetKeyframeAreaWidth() const { return mKeyframeAreaWidth; }
-  int GetTargetMode() const { return mTargetMode; }
+  TargetMode GetTargetMode() const { return mTargetMode; }
   bool IsPinned() const { return mPinned; }
   bool IsAudioTimeUnits() const { return mAudioTimeUnits; }
   bool IsAudioLoop() const { return mAudioLoop; }
   const SequenceRef& GetSequence() const { return mSequence; }
-  const std::vector<TrackItemGroup>& GetSelectedGroups() const { return mSelectedGroups; }
   // The panel's time state: edit line, zoom and the shown clip's span. The view writes it.
   const PanelTimeline& GetTimeline() const { return *mTimeline; }
   TickTime GetClipStart() const;
@@ -254,16 +256,22 @@ class EffectControlsView : public TabView,
  private:
   int GetScrollBarWidth() const;
   float CurrentRatio() const;
+  // The list's width in a panel `panelWidth` wide, from the stored split.
+  int ListWidthFor(int panelWidth) const;
   void StoreRatio(float ratio);
   void ApplyKeyframesVisible();
   void FollowSequence(const SequenceRef& sequence);
-  void FinishClipSelection(int state);
+  // `candidates`: 1 when an item is targeted, else the number of selected groups (the header
+  // tells none from several); the time controls work only with one.
+  void FinishClipSelection(int candidates);
+  // The list shows what `selection` asks for: the same target, built from the same selection.
+  bool ShowsTargetFor(const std::vector<TrackItemGroup>& selection) const;
   // Listens to the master clip's station while it is targeted; null leaves master-clip mode.
   void SetMasterClip(const MasterClipRef& masterClip);
   // The first clip (not transition) before or after `transition` on its track, or null.
   static TrackItemRef NeighbourClip(const TrackItemRef& transition, bool before);
   void TargetClip(const TrackItemRef& item);
-  void TargetTransition(const TrackItemRef& item);
+  void TargetTransition(const TrackItemRef& item, const std::vector<TrackItemGroup>& selection);
   void SetVisibleRange(TickTime start, TickTime end);
   // Zooms to `secondsPerPixel` (already limited); `keepEditLine` places the range around the
   // edit line as ZoomToTimePerPixel describes.
@@ -292,8 +300,10 @@ class EffectControlsView : public TabView,
   // The clip through which master-clip times map to sequence times.
   TrackItemRef GetMasterClipItem() const;
   TickTime SnapToFrame(TickTime time) const;
-  void OnDeferred(int kind);
-  void Defer(int kind);
+  // Work done later on the UI thread (marker and settings messages may arrive while the model
+  // is being edited), posted to the view's own station so it is dropped with the view.
+  void Defer(DeferredWork work, std::int64_t markerID = 0, TickTime time = 0);
+  void OnDeferred(DeferredWork work, std::int64_t markerID, TickTime time);
   void SequenceSelectionLinkingChanged();
   void AudioPartPlayStarted();
   void AudioPartPlayStopped();
@@ -315,11 +325,10 @@ class EffectControlsView : public TabView,
   std::shared_ptr<ScrollBar> mScrollBar;
   SequenceMarkers mMarkers;
 
-  int mTargetMode = kTargetNone;
+  TargetMode mTargetMode = kTargetNone;
   bool mPinned = true;
   bool mKeyframesVisible = true;
   bool mAudioLoop = false;
-  std::vector<TrackItemGroup> mSelectedGroups;
   float mSeparatorRatio = 0.0F;
   float mSeparatorRatioMaximized = 0.0F;
   int mKeyframeAreaWidth = kMinKeyframeWidth;

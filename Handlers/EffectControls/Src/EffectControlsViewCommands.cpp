@@ -311,7 +311,7 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
       if (mTargetMode == kTargetClip) {
         mPinned = !mPinned;
         mKeyframeView->SetPinToClip(mPinned);
-        SetupTimeBarZoomMinMax(mSelectedGroups);
+        SetupTimeBarZoomMinMax(mListView->GetTarget().selection);
         const int width = std::max(1, mZoomLimiter.GetScrollWidth());
         const TickTime span = mRuler->GetZoomOutTime() - mRuler->GetZoomInTime();
         // The new limits place the range around the edit line even at the same zoom.

@@ -20,14 +20,11 @@
 
 namespace {
 
-// Work the view does later on the UI thread (marker and settings messages may arrive while the
-// model is being edited). Posted to the view's own station, so it is dropped with the view.
 struct DeferredViewWorkMessage : MessageOf<DeferredViewWorkMessage> {
   static constexpr std::string_view kTypeName = "EffectControlsView.DeferredViewWorkMessage";
-  enum Kind : int { kReloadMarkers, kReloadTimeDisplays, kInvalidate, kMoveMarker, kEditMarker };
-  DeferredViewWorkMessage(Kind k, std::int64_t id = 0, TickTime t = 0)
-      : kind(k), markerID(id), time(t) {}
-  Kind kind;
+  DeferredViewWorkMessage(EffectControlsView::DeferredWork work, std::int64_t id, TickTime t)
+      : kind(work), markerID(id), time(t) {}
+  EffectControlsView::DeferredWork kind;
   std::int64_t markerID;
   TickTime time;
 };
@@ -36,23 +33,26 @@ struct DeferredViewWorkMessage : MessageOf<DeferredViewWorkMessage> {
 
 // --- Messages ---
 
-void EffectControlsView::Defer(int kind) {
-  PostMessageToUIThread(mStation, std::make_shared<DeferredViewWorkMessage>(
-                                      static_cast<DeferredViewWorkMessage::Kind>(kind)));
+void EffectControlsView::Defer(DeferredWork work, std::int64_t markerID, TickTime time) {
+  PostMessageToUIThread(mStation, std::make_shared<DeferredViewWorkMessage>(work, markerID, time));
 }
 
-void EffectControlsView::OnDeferred(int kind) {
-  switch (kind) {
-    case DeferredViewWorkMessage::kReloadMarkers:
+void EffectControlsView::OnDeferred(DeferredWork work, std::int64_t markerID, TickTime time) {
+  switch (work) {
+    case DeferredWork::kReloadMarkers:
       ReloadMarkers();
       break;
-    case DeferredViewWorkMessage::kReloadTimeDisplays:
-      ReloadTimeDisplays();
-      break;
-    case DeferredViewWorkMessage::kInvalidate:
+    case DeferredWork::kInvalidate:
       Invalidate();
       break;
-    default:
+    case DeferredWork::kMoveMarker:
+      mMarkers.Move(markerID, time);
+      ReloadMarkers();
+      break;
+    case DeferredWork::kEditMarker:
+      // The host has no marker editor yet: the marker is selected for it.
+      mMarkers.Select(markerID);
+      mRuler->Invalidate();
       break;
   }
 }
@@ -85,16 +85,7 @@ void EffectControlsView::AudioPartPlayStopped() {
 
 void EffectControlsView::ListenToMessage(const Message& message) {
   if (const auto* deferred = message.As<DeferredViewWorkMessage>()) {
-    if (deferred->kind == DeferredViewWorkMessage::kMoveMarker) {
-      mMarkers.Move(deferred->markerID, deferred->time);
-      ReloadMarkers();
-    } else if (deferred->kind == DeferredViewWorkMessage::kEditMarker) {
-      // The host has no marker editor yet: the marker is selected for it.
-      mMarkers.Select(deferred->markerID);
-      mRuler->Invalidate();
-    } else {
-      OnDeferred(deferred->kind);
-    }
+    OnDeferred(deferred->kind, deferred->markerID, deferred->time);
   } else if (const auto* m = message.As<SequenceClipSelectionChangedMessage>()) {
     if (m->sequence == mSequence) {
       SequenceClipSelectionChanged(m->sequence);
@@ -202,14 +193,11 @@ void EffectControlsView::ListenToMessage(const Message& message) {
              message.Is<MarkInOutTimeChangingMessage>()) {
     // The ruler shows the mark while it is dragged; the release sets it as one undo step.
   } else if (message.Is<MarkersChangedMessage>()) {
-    Defer(DeferredViewWorkMessage::kReloadMarkers);
+    Defer(DeferredWork::kReloadMarkers);
   } else if (const auto* moved = message.As<MarkerTimeChangedMessage>()) {
-    PostMessageToUIThread(mStation, std::make_shared<DeferredViewWorkMessage>(
-                                        DeferredViewWorkMessage::kMoveMarker, moved->markerID,
-                                        SnapToFrame(moved->newTime)));
+    Defer(DeferredWork::kMoveMarker, moved->markerID, SnapToFrame(moved->newTime));
   } else if (const auto* edit = message.As<EditSequenceMarkerMessage>()) {
-    PostMessageToUIThread(mStation, std::make_shared<DeferredViewWorkMessage>(
-                                        DeferredViewWorkMessage::kEditMarker, edit->markerID));
+    Defer(DeferredWork::kEditMarker, edit->markerID);
   } else if (const auto* right = message.As<TimebarRightButtonDownMessage>()) {
     const Rect holder = mRulerHolder->GetBounds();
     TrackPopupMenu(kSequenceMarkerMenu, Point{holder.left + right->point.x,
@@ -224,7 +212,7 @@ void EffectControlsView::ListenToMessage(const Message& message) {
     ScrollVisibleTime(autoScroll->amount);
   } else if (const auto* become = message.As<EffectControlsBecomeTargetMessage>()) {
     if (become->recomputeZoomRange && mSequence && mTargetMode != kTargetNone) {
-      SetupTimeBarZoomMinMax(mSelectedGroups);
+      SetupTimeBarZoomMinMax(mListView->GetTarget().selection);
       ApplyRulerZoom();
     }
     mKeyframeView->Invalidate();
@@ -237,6 +225,6 @@ void EffectControlsView::ListenToMessage(const Message& message) {
     mKeyframeView->Invalidate();
   } else if (message.Is<MasterClipNameChangedMessage>() ||
              message.Is<MasterClipClipChangedMessage>()) {
-    Defer(DeferredViewWorkMessage::kInvalidate);
+    Defer(DeferredWork::kInvalidate);
   }
 }

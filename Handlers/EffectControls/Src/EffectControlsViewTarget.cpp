@@ -62,7 +62,6 @@ void EffectControlsView::FollowSequence(const SequenceRef& sequence) {
     mTargetStation.clear();
   }
   mSequence = sequence;
-  mSelectedGroups.clear();
   mTargetMode = kTargetNone;
   mTargetItem.reset();
   SetMasterClip(nullptr);
@@ -101,11 +100,9 @@ void EffectControlsView::SequenceClipSelectionChanged(const SequenceRef& sequenc
     return;
   }
   const std::vector<TrackItemGroup> groups = sequence->GetSelection();
-  if ((mTargetMode == kTargetClip || mTargetMode == kTargetTransition) &&
-      groups == mSelectedGroups) {
+  if ((mTargetMode == kTargetClip || mTargetMode == kTargetTransition) && ShowsTargetFor(groups)) {
     return;
   }
-  mSelectedGroups = groups;
   if (!mTargetStation.empty()) {
     RemoveListener(mTargetStation, *this);
     mTargetStation.clear();
@@ -120,7 +117,7 @@ void EffectControlsView::SequenceClipSelectionChanged(const SequenceRef& sequenc
   TrackItemRef audio;
   // The candidates' audio part count is what the list will build; the audio buttons read the
   // built parts from the list once it has rebuilt.
-  int state = static_cast<int>(groups.size());
+  int candidates = static_cast<int>(groups.size());
   if (groups.size() == 1) {
     SequenceClipSelectionChangedForOneTrackItem(groups.front(), video, audio);
   } else if (groups.size() > 1) {
@@ -128,9 +125,9 @@ void EffectControlsView::SequenceClipSelectionChanged(const SequenceRef& sequenc
   }
   bool targeted = true;
   if (video && video->IsTransition()) {
-    TargetTransition(video);
+    TargetTransition(video, groups);
   } else if (audio && audio->IsTransition()) {
-    TargetTransition(audio);
+    TargetTransition(audio, groups);
   } else if (video && video->IsClip()) {
     TargetClip(video);
   } else if (audio && audio->IsClip()) {
@@ -145,9 +142,9 @@ void EffectControlsView::SequenceClipSelectionChanged(const SequenceRef& sequenc
     }
   }
   if (targeted) {
-    state = 1;
+    candidates = 1;
   }
-  FinishClipSelection(state);
+  FinishClipSelection(candidates);
 }
 
 int EffectControlsView::SequenceClipSelectionChangedForOneTrackItem(const TrackItemGroup& group,
@@ -210,9 +207,10 @@ void EffectControlsView::TargetClip(const TrackItemRef& item) {
   mHeader->SetClip(mSequence, item);
 }
 
-void EffectControlsView::TargetTransition(const TrackItemRef& item) {
+void EffectControlsView::TargetTransition(const TrackItemRef& item,
+                                          const std::vector<TrackItemGroup>& selection) {
   mTargetMode = kTargetTransition;
-  SetupTimeBarZoomMinMax(mSelectedGroups);
+  SetupTimeBarZoomMinMax(selection);
   const TickTime start = item->GetStart();
   const TickTime end = item->GetEnd();
   const TickTime duration = end - start;
@@ -255,11 +253,15 @@ void EffectControlsView::TargetMasterClip(const MasterClipRef& masterClip) {
   Invalidate();
 }
 
-void EffectControlsView::FinishClipSelection(int state) {
-  const bool enabled = state == 1;
+bool EffectControlsView::ShowsTargetFor(const std::vector<TrackItemGroup>& selection) const {
+  return mListView->GetTarget() == mListView->ChooseTarget(selection);
+}
+
+void EffectControlsView::FinishClipSelection(int candidates) {
+  const bool enabled = candidates == 1;
   if (!enabled) {
     mTargetMode = kTargetNone;
-    mHeader->SetNoTarget(state);
+    mHeader->SetNoTarget(candidates);
     mZoomLimiter.SetMinMaxTime(0, 0);
     SetShownRange(0, 0);
   }
@@ -331,7 +333,7 @@ void EffectControlsView::OnSequenceChanged(const SequenceRef& sequence, bool set
   if (settingsChanged) {
     ReloadTimeDisplays();
   }
-  const bool sameSelection = sequence->GetSelection() == mSelectedGroups;
+  const bool sameSelection = ShowsTargetFor(sequence->GetSelection());
   const TrackItemRef target = mTargetItem;
   const bool stillThere = target && sequence->Contains(target.get());
   if (sameSelection && stillThere && mTargetMode != kTargetNone && IsShown()) {
@@ -345,18 +347,17 @@ void EffectControlsView::OnSequenceChanged(const SequenceRef& sequence, bool set
       SetShownRange(start, end);
       if (mPinned && moved) {
         mRuler->SetTimeRange(0, sequence->GetEnd());
-        SetupTimeBarZoomMinMax(mSelectedGroups);
+        SetupTimeBarZoomMinMax(mListView->GetTarget().selection);
         SetVisibleRange(start, end);
         SetEditTime(sequence->GetCurrentTime());
       } else if (!mPinned && sequence->GetEnd() != mSequenceEnd) {
-        SetupTimeBarZoomMinMax(mSelectedGroups);
+        SetupTimeBarZoomMinMax(mListView->GetTarget().selection);
         ZoomToTimePerPixel(mTimeline->GetSecondsPerPixel(), false);
       }
     }
     mKeyframeView->Invalidate();
     return;
   }
-  mSelectedGroups.clear();
   mTargetMode = kTargetNone;
   SequenceClipSelectionChanged(sequence);
 }

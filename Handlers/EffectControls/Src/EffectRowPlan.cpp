@@ -80,26 +80,6 @@ PlannedRow ParamRow(PlannedRowKind kind, const ComponentRef& component,
   return row;
 }
 
-// The number of parameters a counted group spans: the semicolons in its value at time zero,
-// read as text (a string, or binary data holding UTF-16 text, low byte first). Kept in step
-// with GroupBeginParameter::CountGroupEntries, which the rows cannot share with a plan that
-// knows no views.
-std::size_t CountGroupEntries(const ComponentParam& param) {
-  const ParamValue value = param.GetValueAt(kTime_Zero);
-  if (const auto* text = std::get_if<std::string>(&value)) {
-    return static_cast<std::size_t>(std::count(text->begin(), text->end(), ';'));
-  }
-  if (const auto* blob = std::get_if<ParamBlob>(&value)) {
-    // A trailing odd byte is no code unit.
-    std::size_t count = 0;
-    for (std::size_t i = 0; i + 1 < blob->bytes.size(); i += 2) {
-      count += blob->bytes[i] == ';' && blob->bytes[i + 1] == 0 ? 1 : 0;
-    }
-    return count;
-  }
-  return 0;
-}
-
 // One group open while a component's parameters are walked. `row` lives in the children of
 // the group below it on the stack (or of the effect), which grow only once it is closed.
 struct OpenGroup {
@@ -140,7 +120,7 @@ void AppendParameters(PlannedRow& effect, int baseLevel) {
           ParamRow(PlannedRowKind::Group, component, param, position, level()));
       OpenGroup open{&parent.children.back(), -1};
       if (param->GetGroupKind() == GroupKind::Counted) {
-        open.remaining = static_cast<long long>(CountGroupEntries(*param));
+        open.remaining = static_cast<long long>(param->CountGroupEntries());
       }
       stack.push_back(open);
     } else if (param->GetType() == ParamType::GroupEnd) {

@@ -447,11 +447,11 @@ void FilterItem::SetIsExpanded(bool expanded) {
   properties.SetBool(kExpandedPropertyKey, expanded);
 }
 
-void FilterItem::GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const {
+void FilterItem::GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const {
   if (mOffline) {
     return;
   }
-  EffectItem::GetKeyframeTimes(times, toSequenceTime);
+  EffectItem::GetKeyframeTimes(times, line);
 }
 
 // --- Placement ---

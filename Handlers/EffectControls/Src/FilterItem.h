@@ -70,7 +70,7 @@ class FilterItem : public EffectItem, public Commander {
   // Records the state, shows or hides the children, and writes it to the component when the
   // row persists its expansion.
   void SetIsExpanded(bool expanded) override;
-  void GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const override;
+  void GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const override;
   // The base placement, then the switch and buttons (see the .cpp for the offsets).
   void PositionSelf(int top, int depth, int width) override;
   int GetGroupLevelIndentInPixels() const override;

@@ -80,3 +80,13 @@ std::shared_ptr<const TickTime> PanelTimeline::ShareEditTime(
 void PanelTimeline::Announce(unsigned changes) const {
   BroadcastMessage(mStation, PanelTimelineChangedMessage(changes));
 }
+
+double PanelTimeline::TimeToX(TickTime time) const {
+  return static_cast<double>(time - mVisibleStart) /
+         (mSecondsPerPixel * static_cast<double>(kTicksPerSecond));
+}
+
+TickTime PanelTimeline::XToTime(double x) const {
+  // Saturates: a huge zoom or a pixel far off the area must not overflow.
+  return AddTimes(mVisibleStart, SecondsToTicks(x * mSecondsPerPixel));
+}

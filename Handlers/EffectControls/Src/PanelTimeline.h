@@ -55,6 +55,10 @@ class PanelTimeline {
   // One frame of this rate lasts one pixel, in whole ticks: at least one tick, and saturated
   // for spans too long to count.
   const FrameRate& GetPixelFrameRate() const { return mPixelFrameRate; }
+  // Where `time` lies in the keyframe area, in pixels from its left edge (fractional), and the
+  // time at `x` (to the nearest tick, limited to [kTime_Min, kTime_Max]).
+  double TimeToX(TickTime time) const;
+  TickTime XToTime(double x) const;
 
   // The targeted clip's or transition's span; an end before the start is taken as the start.
   TickTime GetShownStart() const { return mShownStart; }

@@ -8,20 +8,11 @@
 #include "Host/Model/KeyframeMultiSelection.h"
 #include "Host/Toolkit/MultiPictureButton.h"
 #include "Tests/Handlers/EffectControls/EffectControlsListViewTestSupport.h"
+#include "Tests/Host/Model/WideText.h"
 
 namespace {
 
 using Strings = std::vector<std::string>;
-
-// Text as the host stores it in binary parameter values: UTF-16, low byte first.
-ParamBlob WideText(std::string_view text) {
-  ParamBlob blob;
-  for (const char c : text) {
-    blob.bytes.push_back(static_cast<std::uint8_t>(c));
-    blob.bytes.push_back(0);
-  }
-  return blob;
-}
 
 ComponentRef CountedGroupEffect(std::string_view spans, std::vector<std::string> following) {
   ComponentRef effect = Component::Create("XO.KRVN Test", "Test", MediaType::Video, false);

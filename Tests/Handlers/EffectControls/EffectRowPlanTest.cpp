@@ -13,22 +13,13 @@
 #include "Host/Model/ComponentParam.h"
 #include "Host/Model/EffectCatalogue.h"
 #include "Host/Model/TrackItem.h"
+#include "Tests/Host/Model/WideText.h"
 
 namespace {
 
 using Strings = std::vector<std::string>;
 
 constexpr TickTime kSecond = kTicksPerSecond;
-
-// Text as the host stores it in binary parameter values: UTF-16, low byte first.
-ParamBlob WideText(std::string_view text) {
-  ParamBlob blob;
-  for (const char c : text) {
-    blob.bytes.push_back(static_cast<std::uint8_t>(c));
-    blob.bytes.push_back(0);
-  }
-  return blob;
-}
 
 // "Name", "mask Name", "<shape>", "<custom 1>", with "@level" when nested.
 std::string Label(const PlannedRow& row) {

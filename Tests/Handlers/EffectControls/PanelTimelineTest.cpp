@@ -92,6 +92,19 @@ TEST_F(PanelTimelineTest, ThePixelFrameRateFollowsTheZoomAndSaturatesAtTheEnds) 
   EXPECT_EQ(timeline->GetPixelFrameRate().GetTicksPerFrame(), 1);
 }
 
+TEST_F(PanelTimelineTest, PixelsAndTimesConvertBothWaysAndSaturateFarOff) {
+  timeline->SetVisibleStart(2 * kSecond);
+  timeline->SetSecondsPerPixel(0.01);
+  EXPECT_DOUBLE_EQ(timeline->TimeToX(3 * kSecond), 100.0);
+  EXPECT_DOUBLE_EQ(timeline->TimeToX(kSecond), -100.0);
+  EXPECT_EQ(timeline->XToTime(100.0), 3 * kSecond);
+  EXPECT_EQ(timeline->XToTime(0.5), 2 * kSecond + kSecond / 200);
+  EXPECT_EQ(timeline->XToTime(1e300), kTime_Max);
+  timeline->SetVisibleStart(0);
+  timeline->SetSecondsPerPixel(std::numeric_limits<double>::infinity());
+  EXPECT_EQ(timeline->XToTime(-1.0), kTime_Min);
+}
+
 TEST_F(PanelTimelineTest, AShownRangeEndingBeforeItStartsIsEmptyAtItsStart) {
   EXPECT_TRUE(timeline->SetShownRange(5 * kSecond, 2 * kSecond));
   EXPECT_EQ(timeline->GetShownStart(), 5 * kSecond);

@@ -197,7 +197,9 @@ TEST_F(EffectItemTest, KeyframeTimesOfAFolderSkipSetAsideChildren) {
   class KeyedRow : public TestRow {
    public:
     KeyedRow(std::string name, TickTime t) : TestRow(std::move(name), false), mTime(t) {}
-    void GetKeyframeTimes(std::set<TickTime>& times, bool) const override { times.insert(mTime); }
+    void GetKeyframeTimes(std::set<TickTime>& times, TimeLine) const override {
+      times.insert(mTime);
+    }
 
    private:
     TickTime mTime;
@@ -209,7 +211,7 @@ TEST_F(EffectItemTest, KeyframeTimesOfAFolderSkipSetAsideChildren) {
   folder->AddItem(a);
   folder->AddItem(b);
   std::set<TickTime> times;
-  folder->GetKeyframeTimes(times, true);
+  folder->GetKeyframeTimes(times, TimeLine::kSequence);
   EXPECT_EQ(times, (std::set<TickTime>{10}));
 }
 

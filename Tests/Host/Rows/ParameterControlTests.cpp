@@ -178,8 +178,8 @@ TEST_F(ParameterControlTest, KeyframeTimesComeInSequenceOrClipTime) {
   ComponentParamActions::AddKeyframe(opacity, 6 * kSecond);
   std::set<TickTime> sequenceTimes;
   std::set<TickTime> clipTimes;
-  row->GetKeyframeTimes(sequenceTimes, true);
-  row->GetKeyframeTimes(clipTimes, false);
+  row->GetKeyframeTimes(sequenceTimes, TimeLine::kSequence);
+  row->GetKeyframeTimes(clipTimes, TimeLine::kClip);
   EXPECT_EQ(sequenceTimes, (std::set<TickTime>{11 * kSecond}));
   EXPECT_EQ(clipTimes, (std::set<TickTime>{6 * kSecond}));
 }

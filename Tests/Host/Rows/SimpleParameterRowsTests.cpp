@@ -182,11 +182,11 @@ TEST_F(SimpleRowsTest, AReadOnlyExpansionPropertyIsNotOverwrittenAndAWarningIsPo
 
 TEST_F(SimpleRowsTest, ACountedGroupSpansAsManyParametersAsItsTextHasSemicolons) {
   auto counted = ComponentParam::Create("Set", ParamType::GroupBegin, std::string("a;b;c;"));
-  EXPECT_EQ(GroupBeginParameter::CountGroupEntries(*counted), 3u);
+  EXPECT_EQ(counted->CountGroupEntries(), 3u);
   // Wide text: ";" is the code unit 0x003B, low byte first.
   ParamBlob wide{{'x', 0, ';', 0, 0x3B, 0x01, ';', 0, ';'}};
   auto binary = ComponentParam::Create("Bin", ParamType::GroupBegin, wide);
-  EXPECT_EQ(GroupBeginParameter::CountGroupEntries(*binary), 2u);
+  EXPECT_EQ(binary->CountGroupEntries(), 2u);
 }
 
 TEST_F(SimpleRowsTest, AGroupCollectsTheKeyframesOfItsChildren) {
@@ -196,7 +196,7 @@ TEST_F(SimpleRowsTest, AGroupCollectsTheKeyframesOfItsChildren) {
   auto group = MakeRow<GroupBeginParameter>(begin);
   group->AddItem(std::make_shared<CheckboxParameter>(Info(member)));
   std::set<TickTime> times;
-  group->GetKeyframeTimes(times, true);
+  group->GetKeyframeTimes(times, TimeLine::kSequence);
   EXPECT_EQ(times, (std::set<TickTime>{11 * kSecond}));
 }
 
