@@ -199,6 +199,25 @@ TEST(KeyframeCurve, AutoBezierFlattensAtATurnAndDoesNotOvershoot) {
   }
 }
 
+TEST(KeyframeCurve, AutoBezierSpeedIsCappedBesideAGentleSegment) {
+  // A gentle rise (1 a second) into a steep one (1000 a second): the chord through the middle
+  // key is far steeper than three times the gentle slope, so the cap decides its speed.
+  KeyframeCurve curve;
+  curve.Add(Key(0, 0.0, TemporalInterpolation::AutoBezier));
+  curve.Add(Key(kSecond, 1.0, TemporalInterpolation::AutoBezier));
+  curve.Add(Key(kSecond + kSecond / 10, 101.0, TemporalInterpolation::AutoBezier));
+  EXPECT_NEAR(curve.At(1).inSpeed, 3.0, 1e-9);
+  EXPECT_NEAR(curve.At(1).outSpeed, 3.0, 1e-9);
+  // Uncapped, the curve would dip far below its first key before climbing to the second.
+  double previous = Scalar(curve, 0);
+  for (TickTime t = kSecond / 100; t <= kSecond + kSecond / 10; t += kSecond / 100) {
+    const double v = Scalar(curve, t);
+    EXPECT_GE(v, previous - 1e-9) << t;
+    EXPECT_GE(v, 0.0 - 1e-9) << t;
+    previous = v;
+  }
+}
+
 TEST(KeyframeCurve, AutoBezierSpeedsFollowEveryEdit) {
   KeyframeCurve curve;
   for (int i = 0; i < 5; ++i) {

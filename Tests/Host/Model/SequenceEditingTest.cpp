@@ -188,6 +188,41 @@ TEST_F(SequenceEditingTest, PlainTrimStopsAtTheNeighbourAndAtTheMedia) {
            }});
 }
 
+// Clip D [14 s, 16 s) touching C's end with no transition, showing B's file from 20 s: media
+// long before its in point, so only C and the one-frame minimum bound the edits at the cut.
+class TouchingClipsTest : public SequenceEditingTest {
+ protected:
+  TrackItemRef d = builder.AddClip(
+      v1, clipB, {.start = 14 * kSec, .end = 16 * kSec, .mediaIn = 20 * kSec, .linkGroup = 4});
+};
+
+TEST_F(TouchingClipsTest, PlainTrimOfAStartThatTouchesTheClipBeforeCannotGrowOverIt) {
+  EXPECT_EQ(SequenceActions::QueryTrimItems({d}, Edge::Start, -kSec, false), 0);
+  const std::string before = State();
+  EXPECT_EQ(SequenceActions::TrimItems({d}, Edge::Start, -F(1), false), EditStatus::TimeOutOfRange);
+  EXPECT_EQ(State(), before);
+  // Shortening stays possible, down to one frame.
+  EXPECT_EQ(SequenceActions::QueryTrimItems({d}, Edge::Start, 10 * kSec, false), 2 * kSec - F(1));
+  // And the end of C, touching D, cannot grow either.
+  EXPECT_EQ(SequenceActions::QueryTrimItems({c}, Edge::End, kSec, false), 0);
+}
+
+TEST_F(TouchingClipsTest, RollingACutWithoutATransitionKeepsAFrameOfEachClip) {
+  EXPECT_EQ(SequenceActions::QueryRollItems(c, d, -10 * kSec), -2 * kSec + F(1));
+  EXPECT_EQ(SequenceActions::QueryRollItems(c, d, 10 * kSec), 2 * kSec - F(1));
+  const std::string before = State();
+  EXPECT_EQ(SequenceActions::RollItems(c, d, -2 * kSec), EditStatus::TimeOutOfRange);
+  EXPECT_EQ(SequenceActions::RollItems(c, d, 2 * kSec), EditStatus::TimeOutOfRange);
+  EXPECT_EQ(State(), before);
+  CheckUndoRoundTrip({.name = SequenceActions::kRollItems,
+                      .edit = [&] { return SequenceActions::RollItems(c, d, -2 * kSec + F(1)); },
+                      .checkEdited =
+                          [&] {
+                            EXPECT_EQ(Span(c), "[300,301)");
+                            EXPECT_EQ(Span(d), "[301,400)");
+                          }});
+}
+
 TEST_F(SequenceEditingTest, EditsBeyondTheLimitsOrOnAReadOnlySequenceChangeNothing) {
   const std::string before = State();
   const std::size_t steps = project->GetUndoStack().GetUndoNames().size();
