@@ -12,12 +12,16 @@
 #include <vector>
 
 #include "Apps/effectcontrols/EmbeddedDemoProject.h"
+#include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessageLoop.h"
+#include "Host/Messaging/Station.h"
+#include "Host/Model/ModelMessages.h"
 #include "Host/Model/Project.h"
 #include "Host/Model/ProjectFile.h"
 #include "Host/Shell/Application.h"
 #include "Host/Shell/AutomationScript.h"
 #include "Host/Shell/ProgramOptions.h"
+#include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ScriptRunner.h"
 #include "Host/Shell/Sdl/SdlInputBox.h"
 #include "Host/Shell/Sdl/SdlMenuTracker.h"
@@ -57,7 +61,14 @@ ProjectRef OpenDemoProject(std::string& error) {
   return loaded.project;
 }
 
+// A file that does not exist yet, in a folder that does, is a new, empty project that saves
+// there.
 ProjectRef OpenProjectFile(const std::string& path, std::string& error) {
+  const std::filesystem::path file(path);
+  const std::filesystem::path folder = file.has_parent_path() ? file.parent_path() : ".";
+  std::error_code ec;
+  if (!std::filesystem::exists(file, ec) && !ec && std::filesystem::is_directory(folder, ec))
+    return Project::Create(file.stem().string());
   ProjectLoadResult loaded = ProjectFile::Load(path);
   if (!loaded)
     error = loaded.error.starts_with(path) ? loaded.error : path + ": " + loaded.error;
@@ -68,6 +79,10 @@ void AllowSaving(ScriptRunner& runner) {
   runner.SetProjectSaver([](const Project& project, const std::string& path, std::string* error) {
     return ProjectFile::Save(project, path, error);
   });
+}
+
+std::string WindowTitle(const ProjectDocument& document) {
+  return "Effect Controls - " + document.GetTitle();
 }
 
 // `scriptPath` names the script in a failure (empty for the program's own one-shot frame).
@@ -103,17 +118,30 @@ int Run(const ProgramOptions& options) {
   Application application(options.size);
   application.LoadModules();
   application.CreateHandlers();
-  application.OpenProject(std::move(project));
+  application.OpenProject(std::move(project), options.projectPath);
+  ProjectDocument& document = *application.GetDocument();
+  document.SetFailureReporter([](const std::string& reason) {
+    std::cerr << "effectcontrols: the project was not saved: " << reason << "\n";
+  });
   application.OpenAllWindows();
   Settle(application);
 
   const bool windowed = !options.headless && HasDisplay();
   if (windowed) {
-    const std::string title = "Effect Controls - " + application.GetProject()->GetName();
-    const auto window = SdlWindow::Open(application.GetViewHost(), title, &error);
+    const auto window = SdlWindow::Open(application.GetViewHost(), WindowTitle(document), &error);
     if (window == nullptr)
       return Fail(kExitCannotStart, "cannot open a window (" + error + "); use --headless");
     if (!script) {
+      // The title marks unsaved changes; a failed save is shown; closing asks to save them.
+      FunctionListener history([&](const Message& message) {
+        if (message.Is<UndoHistoryChangedMessage>())
+          window->SetTitle(WindowTitle(document));
+      });
+      AddListener(application.GetProject()->GetStation(), history);
+      document.SetFailureReporter([&window](const std::string& reason) {
+        window->ShowMessage("The project was not saved", reason);
+      });
+      window->SetCloseGuard([&document] { return document.ConfirmClose(); });
       // Popup menus and input boxes appear over the window.
       const auto previousMenus = SetMenuTracker(std::make_shared<SdlMenuTracker>(*window));
       const auto previousBoxes = InputBox::SetResponder(std::make_shared<SdlInputBox>(*window));

@@ -99,7 +99,7 @@ bool UndoStack::Redo() {
       mDone.push_back(std::move(step));
     } else {
       // The model no longer matches what the later steps expect.
-      mUndone.clear();
+      ForgetUndoneSteps();
     }
   }
   NotifyHistoryChanged();
@@ -178,27 +178,52 @@ UndoStack::ScopedCompound::~ScopedCompound() {
   mStack.EndCompound();
 }
 
+void UndoStack::MarkSaved() {
+  mSavedDepth = mDone.size();
+  NotifyHistoryChanged();
+}
+
+bool UndoStack::IsAtSavedState() const {
+  return mSavedDepth == mDone.size();
+}
+
 void UndoStack::Clear() {
+  const bool saved = IsAtSavedState();
   mDone.clear();
   mUndone.clear();
+  mSavedDepth = saved ? std::optional<std::size_t>(0) : std::nullopt;
   NotifyHistoryChanged();
 }
 
 void UndoStack::SetMaximumSteps(std::size_t steps) {
   mMaximumSteps = steps < 1 ? 1 : steps;
   if (mDone.size() > mMaximumSteps) {
-    mDone.erase(mDone.begin(),
-                mDone.begin() + static_cast<std::ptrdiff_t>(mDone.size() - mMaximumSteps));
+    DropOldestSteps(mDone.size() - mMaximumSteps);
   }
 }
 
 void UndoStack::PushStep(std::unique_ptr<Action> step) {
-  mUndone.clear();
+  ForgetUndoneSteps();
   mDone.push_back(std::move(step));
   if (mDone.size() > mMaximumSteps) {
-    mDone.erase(mDone.begin());
+    DropOldestSteps(1);
   }
   NotifyHistoryChanged();
+}
+
+void UndoStack::DropOldestSteps(std::size_t count) {
+  mDone.erase(mDone.begin(), mDone.begin() + static_cast<std::ptrdiff_t>(count));
+  if (mSavedDepth) {
+    mSavedDepth =
+        *mSavedDepth >= count ? std::optional<std::size_t>(*mSavedDepth - count) : std::nullopt;
+  }
+}
+
+void UndoStack::ForgetUndoneSteps() {
+  mUndone.clear();
+  if (mSavedDepth && *mSavedDepth > mDone.size()) {
+    mSavedDepth.reset();
+  }
 }
 
 void UndoStack::NotifyHistoryChanged() {

@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -60,7 +61,14 @@ class UndoStack {
 
   bool IsPerformingUndoOrRedo() const { return mPerforming; }
 
-  // Forgets every step (the model stays as it is).
+  // The state last saved: MarkSaved records the current state (after the project was written);
+  // IsAtSavedState holds while undo and redo lead back to it. A new step made after undoing past
+  // it, or the steps that reach it dropped beyond the maximum, make it unreachable until the next
+  // MarkSaved. A new history starts at its saved state. Both announce the history changed.
+  void MarkSaved();
+  bool IsAtSavedState() const;
+
+  // Forgets every step (the model stays as it is, and so does whether it is saved).
   void Clear();
   // The oldest steps are dropped beyond this many (at least 1).
   void SetMaximumSteps(std::size_t steps);
@@ -68,6 +76,10 @@ class UndoStack {
 
  private:
   void PushStep(std::unique_ptr<Action> step);
+  // The `count` oldest done steps are gone: the saved state moves down with them, or out of reach.
+  void DropOldestSteps(std::size_t count);
+  // The undone steps are gone: a saved state among them is out of reach.
+  void ForgetUndoneSteps();
   void NotifyHistoryChanged();
 
   StationName mStation;
@@ -78,4 +90,6 @@ class UndoStack {
   int mNestedCompounds = 0;  // compounds opened from inside an action's Do
   bool mPerforming = false;
   std::size_t mMaximumSteps = 1000;
+  // How many done steps lead to the saved state; none when it cannot be reached any more.
+  std::optional<std::size_t> mSavedDepth = 0;
 };

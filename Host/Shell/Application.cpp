@@ -12,6 +12,7 @@
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Handler.h"
 #include "Host/Shell/Module.h"
+#include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ShellMessages.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/StandardCommands.h"
@@ -304,11 +305,12 @@ void Application::CloseAllTabs() {
 
 // --- Project and sequence ---
 
-void Application::OpenProject(ProjectRef project) {
+void Application::OpenProject(ProjectRef project, std::string path) {
   CloseProject();
   mProject = std::move(project);
   if (mProject == nullptr)
     return;
+  mDocument = std::make_unique<ProjectDocument>(mProject, std::move(path));
   SequenceRef sequence = mProject->GetActiveSequence();
   if (sequence == nullptr && !mProject->GetSequences().empty())
     sequence = mProject->GetSequences().front();
@@ -324,6 +326,7 @@ void Application::CloseProject() {
   mOpenedSequences.clear();
   for (const SequenceRef& sequence : opened)
     BroadcastMessage(kSequenceActivationStation, SequenceClosedMessage(sequence));
+  mDocument.reset();
   mProject.reset();
 }
 

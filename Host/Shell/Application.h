@@ -19,6 +19,7 @@
 class CommandHandler;
 class Handler;
 class Module;
+class ProjectDocument;
 class TabView;
 class UndoStack;
 class ViewBase;
@@ -110,10 +111,13 @@ class Application {
 
   // --- Project and sequence ---
   // Closes the open project (SequenceClosedMessage for each opened sequence), takes `project`,
-  // and activates its active sequence, else its first one.
-  void OpenProject(ProjectRef project);
+  // and activates its active sequence, else its first one. `path` is the file it was read from
+  // (empty: none yet); the document saves there.
+  void OpenProject(ProjectRef project, std::string path = {});
   void CloseProject();
   const ProjectRef& GetProject() const { return mProject; }
+  // The open project's file: saving and whether it changed. Null without a project.
+  ProjectDocument* GetDocument() const { return mDocument.get(); }
   // Makes `sequence` (of the open project) the active one: SequenceOpenedMessage the first time,
   // then the project's SequenceActivatedMessage, and on the sequence-activation station
   // SequenceActivatedMessage and SequenceFocusedMessage. False for a sequence of no open project.
@@ -169,4 +173,5 @@ class Application {
   HostTool mTool = HostTool::kPointer;
   bool mMenusDisabled = false;
   std::unique_ptr<CommandHandler> mEditCommands;  // undo and redo
+  std::unique_ptr<ProjectDocument> mDocument;     // save and save as
 };

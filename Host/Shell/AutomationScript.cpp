@@ -34,6 +34,7 @@ const std::map<std::string, VerbInfo, std::less<>>& VerbTable() {
       {"shot", {ScriptVerb::kShot, true}},
       {"dump", {ScriptVerb::kDump, true}},
       {"save", {ScriptVerb::kSave, true}},
+      {"close", {ScriptVerb::kClose, false}},
   };
   return table;
 }
@@ -107,6 +108,7 @@ class LineParser {
       case ScriptVerb::kSelectNone:
       case ScriptVerb::kUndo:
       case ScriptVerb::kRedo:
+      case ScriptVerb::kClose:
         return ExpectNoArguments();
       case ScriptVerb::kTime:
         return ParseTime();

@@ -31,6 +31,7 @@ enum class ScriptVerb {
   kShot,
   kDump,
   kSave,
+  kClose,
 };
 
 // Key modifier bits of the host's modifier word.

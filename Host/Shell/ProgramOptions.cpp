@@ -86,7 +86,8 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
 std::string ProgramOptions::Usage() {
   return "usage: effectcontrols [--project FILE] [--size WxH] [--script FILE] [--out DIR] "
          "[--headless]\n"
-         "  --project FILE  project to open (default: the built-in demo project)\n"
+         "  --project FILE  project to open and save with Ctrl+S; a new one when FILE does not\n"
+         "                  exist yet (default: the built-in demo project, saved where asked)\n"
          "  --size WxH      workspace (window) size in pixels (default 960x540)\n"
          "  --script FILE   automation script to run; shots and dumps go under --out\n"
          "  --out DIR       folder for shots, dumps and saves (default: the current folder)\n"
@@ -96,5 +97,6 @@ std::string ProgramOptions::Usage() {
          "  click|rclick|dblclick X Y [shift] [ctrl] [alt] | drag X1 Y1 X2 Y2 [steps N] [mods]\n"
          "  move X Y | wheel DY | key NAME [mods] | type TEXT\n"
          "  command ID-or-NAME | menu-answer ID-or-NAME|none | input-answer TEXT\n"
-         "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE\n";
+         "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE (a copy)\n"
+         "  close (as the window's close button: asks to save changes; ends the script)\n";
 }

@@ -13,6 +13,7 @@
 #include "Host/Model/Sequence.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Application.h"
+#include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ScriptInputRoute.h"
 #include "Host/Shell/StateDumpWriter.h"
 #include "Host/Shell/WorkspaceFrame.h"
@@ -103,6 +104,13 @@ ScriptRunResult ScriptRunner::Run(const AutomationScript& script) {
       result.message = std::move(error);
       return result;
     }
+    if (result.closed) {
+      if (&command != &script.Commands().back()) {
+        result.warnings.push_back(LineText(command.line) +
+                                  "the project was closed: the lines after it did not run");
+      }
+      break;
+    }
   }
   if (!mPendingMenuAnswers.empty()) {
     result.warnings.push_back(std::to_string(mPendingMenuAnswers.size()) +
@@ -160,6 +168,8 @@ std::string ScriptRunner::Execute(const ScriptCommand& command, ScriptRunResult&
       return RunDump(command, result);
     case ScriptVerb::kSave:
       return RunSave(command, result);
+    case ScriptVerb::kClose:
+      return RunClose(command, result);
   }
   return "unknown verb";
 }
@@ -387,6 +397,19 @@ std::string ScriptRunner::RunSave(const ScriptCommand& command, ScriptRunResult&
   if (!mProjectSaver(*project, path, &error))
     return "cannot save '" + path + "': " + (error.empty() ? "unknown error" : error);
   result.written.push_back(path);
+  return {};
+}
+
+std::string ScriptRunner::RunClose(const ScriptCommand& command, ScriptRunResult& result) {
+  ProjectDocument* document = mApplication.GetDocument();
+  if (document == nullptr)
+    return "no project is open";
+  if (document->ConfirmClose()) {
+    result.closed = true;
+  } else if (!document->GetLastError().empty()) {
+    result.warnings.push_back(LineText(command.line) +
+                              "the save before closing failed: " + document->GetLastError());
+  }
   return {};
 }
 

@@ -27,6 +27,7 @@ struct ScriptRunResult {
   std::string message;                // why it failed; empty when ok
   std::vector<std::string> warnings;  // "line N: ..." for things that did not stop the run
   std::vector<std::string> written;   // files written (shots, dumps), in order
+  bool closed = false;                // `close` was agreed to: the lines after it did not run
 
   // "line 3: unknown command name 'x'" (or just the message for line 0).
   std::string Describe() const;
@@ -77,6 +78,8 @@ class ScriptRunner {
   std::string RunMenuAnswer(const ScriptCommand& command);
   std::string RunUndoRedo(bool undo);
   std::string RunShot(const ScriptCommand& command, ScriptRunResult& result);
+  // Asks to close the project as the window's close button does (a popup when it changed).
+  std::string RunClose(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunDump(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunSave(const ScriptCommand& command, ScriptRunResult& result);
   std::string WriteFile(const std::string& path, const std::string& content);

@@ -7,6 +7,7 @@
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Application.h"
+#include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/StateDumpSource.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/TabView.h"
@@ -122,6 +123,13 @@ std::string StateDumpWriter::Write(Application& application) {
   undo["done"] = stack != nullptr ? stack->GetUndoNames() : std::vector<std::string>();
   undo["undone"] = stack != nullptr ? stack->GetRedoNames() : std::vector<std::string>();
   root["undo"] = std::move(undo);
+
+  const ProjectDocument* document = application.GetDocument();
+  root["document"] = document != nullptr ? ordered_json{{"path", document->GetPath()},
+                                                        {"modified", document->IsModified()},
+                                                        {"title", document->GetTitle()},
+                                                        {"lastError", document->GetLastError()}}
+                                         : ordered_json();
 
   ordered_json assertions = ordered_json::array();
   for (const auto& record : RecordedDebugAssertions()) {

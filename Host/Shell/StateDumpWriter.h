@@ -10,6 +10,8 @@ class Application;
 //               group, and its items (id, kind, media, name, start, end, link group), video
 //               tracks first (null without a sequence);
 //   "undo": {"done": [oldest first], "undone": [next redo first]} action names;
+//   "document": the project's file ("" when none yet), whether it changed since it was saved, the
+//               window title and why the last save failed ("" when it worked) (null without one);
 //   "assertions": the recorded debug assertions (message, condition, file, line, function, count);
 //   "panels": one entry per tab in tab order: handler id, tab name, and for views that implement
 //             StateDumpSource their PanelStateDump ("dumped": false for the others).

@@ -15,8 +15,8 @@ struct StandardCommand {
   std::array<KeyStroke, 2> keys;  // unused slots have no key
 };
 
-const std::array<StandardCommand, 8>& StandardCommands() {
-  static const std::array<StandardCommand, 8> commands{{
+const std::array<StandardCommand, 12>& StandardCommands() {
+  static const std::array<StandardCommand, 12> commands{{
       {"cmd.edit.clear",
        kCommandClear,
        {KeyStroke(KeyCode::kDelete), KeyStroke(KeyCode::kBackspace)}},
@@ -33,6 +33,12 @@ const std::array<StandardCommand, 8>& StandardCommands() {
       {"cmd.edit.redo",
        kCommandRedo,
        {KeyStroke(KeyCode::kZ, kKeyModifierCtrl | kKeyModifierShift), KeyStroke()}},
+      {"cmd.file.save", kCommandSave, {KeyStroke(KeyCode::kS, kKeyModifierCtrl), KeyStroke()}},
+      {"cmd.file.saveas",
+       kCommandSaveAs,
+       {KeyStroke(KeyCode::kS, kKeyModifierCtrl | kKeyModifierShift), KeyStroke()}},
+      {"cmd.file.dontsave", kCommandDontSave, {KeyStroke(), KeyStroke()}},
+      {"cmd.file.cancelclose", kCommandCancelClose, {KeyStroke(), KeyStroke()}},
   }};
   return commands;
 }

@@ -395,14 +395,18 @@ struct SdlWindow::Impl {
     }
     switch (event.type) {
       case SDL_QUIT:
-        closed = true;
+        // Closing the last window sends a quit after the window's close: asked once.
+        if (!closeJustRefused)
+          AskToClose();
+        closeJustRefused = false;
         break;
       case SDL_WINDOWEVENT:
         if (event.window.windowID != windowID)
           break;
         switch (event.window.event) {
           case SDL_WINDOWEVENT_CLOSE:
-            closed = true;
+            AskToClose();
+            closeJustRefused = !closed;
             break;
           case SDL_WINDOWEVENT_SIZE_CHANGED:
             ApplySize({event.window.data1, event.window.data2});
@@ -523,6 +527,13 @@ struct SdlWindow::Impl {
   std::array<SDL_Cursor*, SDL_NUM_SYSTEM_CURSORS> cursors{};
   Point lastMouse;
   bool closed = false;
+  std::function<bool()> closeGuard;
+  bool closeJustRefused = false;
+
+  void AskToClose() {
+    if (!closed)
+      closed = !closeGuard || closeGuard();
+  }
 };
 
 SdlWindow::SdlWindow(std::unique_ptr<Impl> impl) : mImpl(std::move(impl)) {}
@@ -556,6 +567,18 @@ void SdlWindow::RequestClose() {
   event.window.windowID = mImpl->windowID;
   event.window.event = SDL_WINDOWEVENT_CLOSE;
   SDL_PushEvent(&event);
+}
+
+void SdlWindow::SetCloseGuard(std::function<bool()> guard) {
+  mImpl->closeGuard = std::move(guard);
+}
+
+void SdlWindow::SetTitle(const std::string& title) {
+  SDL_SetWindowTitle(mImpl->window, title.c_str());
+}
+
+void SdlWindow::ShowMessage(const std::string& title, const std::string& text) {
+  SDL_ShowSimpleMessageBox(SDL_MESSAGEBOX_ERROR, title.c_str(), text.c_str(), mImpl->window);
 }
 
 bool SdlWindow::RunModal(SdlModal& modal) {

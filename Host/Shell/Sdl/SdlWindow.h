@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <string>
 
@@ -36,6 +37,12 @@ class SdlWindow {
   bool IsClosed() const;
   // Queues the window's close event, as the window manager's close button does.
   void RequestClose();
+  // Asked before the window closes (its close button, RequestClose, the system's quit); false
+  // keeps it open. Without one the window always closes.
+  void SetCloseGuard(std::function<bool()> guard);
+  void SetTitle(const std::string& title);
+  // A message box over the window, for what a person must read (a failed save).
+  void ShowMessage(const std::string& title, const std::string& text);
 
   // Shows `modal` over the window and gives it every event until it is done (a nested loop:
   // posted messages and repaints go on meanwhile). False when the window was closed first.

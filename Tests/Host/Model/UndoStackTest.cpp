@@ -176,3 +176,69 @@ TEST_F(UndoStackTest, EveryHistoryChangeIsAnnounced) {
 }
 
 }  // namespace
+
+TEST_F(UndoStackTest, UndoAndRedoBackToTheSavedStateMakeItSavedAgain) {
+  EXPECT_TRUE(stack.IsAtSavedState());  // a new history starts saved
+  stack.Execute(Append(&log, "a"));
+  EXPECT_FALSE(stack.IsAtSavedState());
+  stack.MarkSaved();
+  EXPECT_TRUE(stack.IsAtSavedState());
+  stack.Execute(Append(&log, "b"));
+  EXPECT_FALSE(stack.IsAtSavedState());
+  stack.Undo();
+  EXPECT_TRUE(stack.IsAtSavedState());
+  stack.Undo();
+  EXPECT_FALSE(stack.IsAtSavedState());
+  stack.Redo();
+  EXPECT_TRUE(stack.IsAtSavedState());
+  // A failed action changes nothing, so it leaves the saved state saved.
+  stack.Execute(Failing());
+  EXPECT_TRUE(stack.IsAtSavedState());
+}
+
+TEST_F(UndoStackTest, ANewStepAfterUndoingPastTheSavedStateLosesItForGood) {
+  stack.Execute(Append(&log, "a"));
+  stack.MarkSaved();
+  stack.Undo();
+  stack.Execute(Append(&log, "b"));
+  EXPECT_EQ(log, "b");
+  EXPECT_FALSE(stack.IsAtSavedState());
+  // Undoing to the same depth reaches a state that was never saved.
+  stack.Undo();
+  EXPECT_FALSE(stack.IsAtSavedState());
+  stack.Redo();
+  stack.MarkSaved();
+  EXPECT_TRUE(stack.IsAtSavedState());
+}
+
+TEST_F(UndoStackTest, TheSavedStateFollowsTheHistoryWhenOldStepsAreDropped) {
+  stack.SetMaximumSteps(2);
+  stack.Execute(Append(&log, "a"));
+  stack.Execute(Append(&log, "b"));
+  stack.MarkSaved();
+  stack.Execute(Append(&log, "c"));  // drops "a"
+  stack.Undo();
+  EXPECT_EQ(log, "ab");
+  EXPECT_TRUE(stack.IsAtSavedState());
+  // Saved before "a": once "a" is dropped, undoing everything stops short of it.
+  stack.Clear();
+  log.clear();
+  stack.MarkSaved();
+  stack.Execute(Append(&log, "a"));
+  stack.Execute(Append(&log, "b"));
+  stack.Execute(Append(&log, "c"));
+  stack.Undo();
+  stack.Undo();
+  EXPECT_EQ(log, "a");
+  EXPECT_FALSE(stack.IsAtSavedState());
+}
+
+TEST_F(UndoStackTest, ClearingKeepsWhetherTheModelIsSaved) {
+  stack.Execute(Append(&log, "a"));
+  stack.MarkSaved();
+  stack.Clear();
+  EXPECT_TRUE(stack.IsAtSavedState());
+  stack.Execute(Append(&log, "b"));
+  stack.Clear();
+  EXPECT_FALSE(stack.IsAtSavedState());
+}
