@@ -196,6 +196,23 @@ TEST_F(SdlWindowTest, ClosingTheWindowEndsTheLoop) {
   EXPECT_TRUE(mWindow->IsClosed());
 }
 
+TEST_F(SdlWindowTest, AGuardThatRefusesKeepsTheWindowOpenUntilItAgrees) {
+  int asked = 0;
+  bool agree = false;
+  mWindow->SetCloseGuard([&] {
+    ++asked;
+    return agree;
+  });
+  mWindow->RequestClose();
+  EXPECT_TRUE(mWindow->Pump(0));
+  EXPECT_FALSE(mWindow->IsClosed());
+  EXPECT_EQ(asked, 1);
+  agree = true;
+  mWindow->RequestClose();
+  EXPECT_FALSE(mWindow->Pump(0));
+  EXPECT_EQ(asked, 2);
+}
+
 // One, separator, Two (disabled), Three, More > Four; opened at (10, 10).
 PopupMenuRequest SampleMenu() {
   auto command = [](CommandID id, const char* text, bool enabled) {
