@@ -1,5 +1,5 @@
 # Every target bootstraps the machine first, so each is one command on a fresh Debian machine.
-.PHONY: bootstrap demo test dev bench format clean
+.PHONY: bootstrap demo test dev bench fuzz format clean
 
 bootstrap:
 	@scripts/bootstrap
@@ -22,6 +22,14 @@ bench: bootstrap
 	cmake --preset release -DEC_BUILD_BENCH=ON
 	cmake --build --preset release
 	for b in build/release/Bench/*Bench; do $$b; done
+
+# Fuzzes each parser for FUZZ_SECONDS (default 10 minutes each); crashes land in Fuzz/corpus.
+FUZZ_SECONDS ?= 600
+fuzz: bootstrap
+	@scripts/bootstrap fuzz
+	cmake --preset fuzz
+	cmake --build --preset fuzz
+	scripts/fuzz build/fuzz $(FUZZ_SECONDS)
 
 format:
 	git ls-files '*.h' '*.cpp' | xargs clang-format -i

@@ -14,6 +14,11 @@ if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_L
   target_compile_options(ec_options INTERFACE -Wno-restrict)
 endif()
 
+if(EC_FUZZ)
+  # Coverage for libFuzzer in every library a harness reaches; only the harnesses link its main.
+  target_compile_options(ec_options INTERFACE -fsanitize=fuzzer-no-link)
+endif()
+
 if(EC_SANITIZE)
   set(ec_sanitize_flags -fsanitize=address,undefined -fno-sanitize-recover=all -fno-omit-frame-pointer)
   target_compile_options(ec_options INTERFACE ${ec_sanitize_flags})
