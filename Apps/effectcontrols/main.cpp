@@ -13,6 +13,7 @@
 
 #include "Apps/effectcontrols/EmbeddedDemoProject.h"
 #include "Host/Messaging/MessageLoop.h"
+#include "Host/Messaging/Preferences.h"
 #include "Host/Model/Project.h"
 #include "Host/Model/ProjectFile.h"
 #include "Host/Shell/Application.h"
@@ -100,6 +101,7 @@ int Run(const ProgramOptions& options) {
   if (project == nullptr)
     return Fail(kExitCannotStart, error);
 
+  options.ApplyPreferences(Preferences::Application().Properties());
   Application application(options.size);
   application.LoadModules();
   application.CreateHandlers();
