@@ -135,10 +135,11 @@ ProjectRef BuildDemo() {
   b.AddEffect(effectsClip, kMatchName_Timecode);
   b.AddEffect(effectsClip, kMatchName_GridDistortion);
   b.AddEffect(effectsClip, kMatchName_MatteFromTrack);
-  effectsClip->GetComponentChain()
-      ->FindByMatchName(kMatchName_Motion)
-      ->FindParam("Rotation")
-      ->ApplyState({.value = 720.0});
+  const ComponentParamRef rotation =
+      effectsClip->GetComponentChain()->FindByMatchName(kMatchName_Motion)->FindParam("Rotation");
+  ComponentParam::State turned = rotation->GetState();
+  turned.value = 720.0;
+  rotation->ApplyState(turned);
 
   Markers markers;
   markers.Add({Seconds(4), 0, "Cut here?", "", 1});
