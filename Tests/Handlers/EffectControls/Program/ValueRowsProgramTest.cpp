@@ -64,8 +64,34 @@ std::optional<long long> EffectsClipId() {
   return std::nullopt;
 }
 
+// The parameter `paramName` of the effect `matchName` on the track item `itemId` of a saved
+// project; null when there is none.
+const json* FindParam(const json& project, long long itemId, const char* matchName,
+                      const char* paramName) {
+  for (const json& sequence : project.at("sequences")) {
+    for (const json& track : sequence.at("tracks")) {
+      for (const json& item : track.at("items")) {
+        if (item.at("id").get<long long>() != itemId) {
+          continue;
+        }
+        for (const json& component : item.at("chain").at("components")) {
+          if (component.value("matchName", "") != matchName) {
+            continue;
+          }
+          for (const json& param : component.at("params")) {
+            if (param.value("name", "") == paramName) {
+              return &param;
+            }
+          }
+        }
+      }
+    }
+  }
+  return nullptr;
+}
+
 // Runs the program on the demo with `script`; false (with a failure) when it does not end well.
-bool Run(const fs::path& out, const std::string& script, bool ownRows) {
+bool RunProgram(const fs::path& out, const std::string& script, bool ownRows) {
   const fs::path scriptPath = out / "script.ecs";
   std::ofstream(scriptPath) << script;
   const fs::path log = out / "run.log";
@@ -159,6 +185,14 @@ std::string ControlPoint(const ListPlace& list, const Row& row, int dx) {
   return text.str();
 }
 
+// The disclosure triangle at the row's indent + 3.
+std::string TrianglePoint(const ListPlace& list, const Row& row) {
+  std::ostringstream text;
+  text << list.left + row.groupLevel * kIndentPerGroupLevel + 3 + 5 << " "
+       << list.top + row.top + 10;
+  return text.str();
+}
+
 std::string StopwatchPoint(const ListPlace& list, const Row& row) {
   std::ostringstream text;
   text << list.left + row.groupLevel * kIndentPerGroupLevel + 20 + 8 << " "
@@ -182,11 +216,22 @@ class ValueRowsProgram : public ::testing::TestWithParam<bool> {
     fs::create_directories(out / "edits");
   }
 
-  // Selects the clip at 11 s (inside it) and dumps the rows.
-  json Layout() {
-    std::ostringstream script;
-    script << "time 00:00:11:00\nselect " << clipId << "\ndump rows.json\n";
-    if (!Run(out / "layout", script.str(), GetParam())) {
+  // Selects the clip at 11 s (inside it), opens the collapsed group that holds the opaque
+  // parameter, and dumps the rows; `opening` is set to the script lines that got there.
+  json Layout(std::string& opening) {
+    opening = "time 00:00:11:00\nselect " + std::to_string(clipId) + "\n";
+    if (!RunProgram(out / "layout", opening + "dump closed.json\n", GetParam())) {
+      return {};
+    }
+    const json closedDump = ReadJson(out / "layout" / "closed.json");
+    const json& closed = Panel(closedDump);
+    const auto group = FindRow(closed, {"Grid Distortion", "Advanced"});
+    if (!group) {
+      ADD_FAILURE() << "no Advanced group";
+      return {};
+    }
+    opening += "click " + TrianglePoint(PlaceOf(closed), *group) + "\n";
+    if (!RunProgram(out / "layout", opening + "dump rows.json\n", GetParam())) {
       return {};
     }
     return ReadJson(out / "layout" / "rows.json");
@@ -198,12 +243,18 @@ class ValueRowsProgram : public ::testing::TestWithParam<bool> {
 
 TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProject) {
   const bool ownRows = GetParam();
-  const json layout = Layout();
+  std::string opening;
+  const json layout = Layout(opening);
   ASSERT_FALSE(layout.is_null());
   const json& panel = Panel(layout);
   for (const json& row : panel.at("rows")) {
-    EXPECT_EQ(row.at("class").get<std::string>().find("(host "), std::string::npos)
-        << "a host row stands in for " << row.at("path").dump();
+    const std::string className = row.at("class").get<std::string>();
+    for (const char* own :
+         {"VideoFloatSliderParameter", "AngleSliderParameter", "PointSliderParameter",
+          "ButtonParameter", "TimecodeParameter", "TrackMenuParameter", "OpaqueParameter"}) {
+      EXPECT_NE(className.rfind(std::string(own) + " (host ", 0), 0u)
+          << "a host row stands in for " << row.at("path").dump();
+    }
   }
   const ListPlace list = PlaceOf(panel);
 
@@ -275,7 +326,7 @@ TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProje
   }
 
   std::ostringstream script;
-  script << "time 00:00:11:00\nselect " << clipId << "\nsave before.project.json\n";
+  script << opening << "save before.project.json\n";
   for (std::size_t i = 0; i < edits.size(); ++i) {
     const Edit& edit = edits[i];
     const auto row = FindRow(panel, edit.path, edit.nth);
@@ -301,11 +352,12 @@ TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProje
     }
     script << lines << "\ndump edit" << i << ".dump.json\n";
   }
+  script << "save edited.project.json\n";
   for (std::size_t i = 0; i < edits.size(); ++i) {
     script << "undo\n";
   }
   script << "dump undone.dump.json\nsave undone.project.json\n";
-  ASSERT_TRUE(Run(out / "edits", script.str(), ownRows));
+  ASSERT_TRUE(RunProgram(out / "edits", script.str(), ownRows));
 
   for (std::size_t i = 0; i < edits.size(); ++i) {
     const json dump = ReadJson(out / "edits" / ("edit" + std::to_string(i) + ".dump.json"));
@@ -315,6 +367,35 @@ TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProje
                                   << ") made " << done.size() - i << " steps";
     EXPECT_EQ(done.back(), edits[i].action) << edits[i].path.back();
   }
+  // What the edits wrote, read from the saved file.
+  const json edited = ReadJson(out / "edits" / "edited.project.json");
+  const auto value = [&](const char* matchName, const char* paramName) {
+    const json* param = FindParam(edited, clipId, matchName, paramName);
+    return param != nullptr ? param->at("value") : json();
+  };
+  EXPECT_EQ(value("XO.KRVN Opacity", "Opacity"), (json{{"double", 42.0}}));
+  EXPECT_EQ(value("XO.KRVN MatteFromTrack", "Matte"), (json{{"choice", 3}}));
+  EXPECT_EQ(value("XO.KRVN GridDistortion", "Reset Grid"), (json{{"bool", true}}));
+  // 00:00:02:10 at 25 fps is frame 60, stored in ticks.
+  EXPECT_EQ(value("XO.KRVN Timecode", "Starting Timecode"),
+            (json{{"double", 60.0 * 10160640000.0}}));
+  const json* settings = FindParam(edited, clipId, "XO.KRVN GridDistortion", "Settings");
+  ASSERT_NE(settings, nullptr);
+  EXPECT_TRUE(settings->at("timeVarying").get<bool>());
+  if (ownRows) {
+    const json rotation = value("XO.KRVN Motion", "Rotation");
+    ASSERT_TRUE(rotation.contains("double"));
+    // Three whole turns typed over the rest that the drag left.
+    EXPECT_GT(rotation.at("double").get<double>(), 3 * 360.0 - 180.0);
+    EXPECT_LE(rotation.at("double").get<double>(), 3 * 360.0 + 180.0);
+    const json position = value("XO.KRVN Motion", "Position");
+    ASSERT_TRUE(position.contains("point"));
+    EXPECT_EQ(position.at("point").at(1).get<double>(), 300.0);
+    EXPECT_NE(position.at("point").at(0).get<double>(), 960.0);
+  }
+  EXPECT_NE(ReadText(out / "edits" / "before.project.json"),
+            ReadText(out / "edits" / "edited.project.json"));
+
   const json undone = ReadJson(out / "edits" / "undone.dump.json");
   EXPECT_TRUE(UndoDone(undone).empty());
   EXPECT_EQ(ReadText(out / "edits" / "before.project.json"),
@@ -323,9 +404,9 @@ TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProje
 }
 
 INSTANTIATE_TEST_SUITE_P(BothRowStyles, ValueRowsProgram, ::testing::Bool(),
-                         [](const ::testing::TestParamInfo<bool>& info) {
-                           return info.param ? std::string("OwnSliderRows")
-                                             : std::string("HostRows");
+                         [](const ::testing::TestParamInfo<bool>& param) {
+                           return param.param ? std::string("OwnSliderRows")
+                                              : std::string("HostRows");
                          });
 
 }  // namespace
