@@ -1,5 +1,6 @@
 #include "Handlers/EffectControls/Src/TrackMenuParameter.h"
 
+#include <string_view>
 #include <variant>
 
 #include "Host/Model/ComponentParam.h"

@@ -198,6 +198,21 @@ TEST_F(SliderRowTest, TheTurnsFieldWritesWholeTurnsAndKeepsTheRest) {
   EXPECT_EQ(UndoNames().size(), 1u);
 }
 
+// Feedback shows another parameter's angle without binding to it: no edit goes there, and the
+// next refresh shows the row's own angle again.
+TEST_F(SliderRowTest, FeedbackShowsAnotherAngleUntilTheNextRefresh) {
+  auto row = Make<AngleSliderParameter>(Info(kMatchName_Motion, "Rotation"));
+  ComponentParamRef feedback = ComponentParam::Create("Feedback", ParamType::Angle, 400.0);
+  feedback->SetRange(-1.0e6, 1.0e6);
+  row->SynchToFeedback(feedback);
+  EXPECT_DOUBLE_EQ(row->GetTurnsField()->GetValue(), 1.0);
+  EXPECT_DOUBLE_EQ(row->GetHotText()->GetValue(), 40.0);
+  EXPECT_EQ(row->GetParam(), Param(kMatchName_Motion, "Rotation"));
+  row->SynchToCurrentTime();
+  EXPECT_DOUBLE_EQ(row->GetTurnsField()->GetValue(), 0.0);
+  EXPECT_DOUBLE_EQ(row->GetHotText()->GetValue(), 0.0);
+}
+
 TEST_F(SliderRowTest, AnAngleRowAlwaysSpansAHalfTurnEachWayWhateverTheRange) {
   auto row = Make<AngleSliderParameter>(Info(kMatchName_Motion, "Rotation"));
   EXPECT_FLOAT_EQ(row->GetSlider()->GetMinValue(), -180.0f);
