@@ -7,9 +7,7 @@
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/HotTimecodeControl.h"
 
-TimecodeParameter::TimecodeParameter(const ParameterControlInfo& info)
-    : ParameterControl(info),
-      mTimebase(info.param ? info.param->GetParameterTimebase() : std::nullopt) {}
+TimecodeParameter::TimecodeParameter(const ParameterControlInfo& info) : ParameterControl(info) {}
 
 void TimecodeParameter::ListenToMessage(const Message& message) {
   if (const auto* changing = message.As<HotTimecodeValueChangingMessage>()) {
@@ -33,7 +31,7 @@ void TimecodeParameter::SynchToCurrentTime() {
   if (!mField) {
     return;
   }
-  mField->SetQuantizeFrameRate(mTimebase);
+  mField->SetQuantizeFrameRate(GetTimebase());
   const TickTime time = GetTime();
   if (!mField->IsEditing() && mField->GetTime() != time) {
     mField->SetTime(time);
@@ -48,11 +46,16 @@ TickTime TimecodeParameter::GetTime() const {
   return static_cast<TickTime>(std::llround(*ticks));
 }
 
+std::optional<FrameRate> TimecodeParameter::GetTimebase() const {
+  return GetParam() ? GetParam()->GetParameterTimebase() : std::nullopt;
+}
+
 TickTime TimecodeParameter::Quantize(TickTime time) const {
-  if (!mTimebase) {
+  const std::optional<FrameRate> timebase = GetTimebase();
+  if (!timebase) {
     return time;
   }
-  return FrameToTime(ToFrame(time, *mTimebase), *mTimebase);
+  return FrameToTime(ToFrame(time, *timebase), *timebase);
 }
 
 void TimecodeParameter::OnTimecodeChanging(TickTime time) {

@@ -28,7 +28,8 @@ class TimecodeParameter : public ParameterControl {
   TickTime GetTime() const;
   // `time` as the row writes it: the start of its frame of the timebase; unchanged without one.
   TickTime Quantize(TickTime time) const;
-  const std::optional<FrameRate>& GetTimebase() const { return mTimebase; }
+  // The bound parameter's timebase; nullopt for none.
+  std::optional<FrameRate> GetTimebase() const;
   HotTimecodeControl* GetField() const { return mField.get(); }
 
   // A step of a scrub and the end of a gesture.
@@ -43,5 +44,4 @@ class TimecodeParameter : public ParameterControl {
 
  private:
   std::shared_ptr<HotTimecodeControl> mField;
-  std::optional<FrameRate> mTimebase;
 };

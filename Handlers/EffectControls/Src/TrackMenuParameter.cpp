@@ -102,19 +102,44 @@ void TrackMenuParameter::CreateControlsSelf() {
   if (mPopup) {
     mPopup->SetTitle(GetParam() ? GetParam()->GetDisplayName() : std::string());
   }
-  if (GetSequence()) {
-    mSequenceStation = GetSequence()->GetStation();
-    AddListener(mSequenceStation, *this);
-  }
+  ListenToSequence();
   RebuildMenuFromSequence();
 }
 
 void TrackMenuParameter::DestroyControlsSelf() {
+  StopListeningToSequence();
+  DestroyControl(mPopup);
+}
+
+void TrackMenuParameter::UpdateParamBinding(const SequenceRef& sequence,
+                                            const ComponentRef& component,
+                                            const ComponentParamRef& param,
+                                            const TrackItemRef& trackItem,
+                                            const StationName& playerStation) {
+  const bool created = mPopup != nullptr;
+  if (created) {
+    StopListeningToSequence();
+  }
+  ParameterControl::UpdateParamBinding(sequence, component, param, trackItem, playerStation);
+  if (created) {
+    ListenToSequence();
+    RebuildMenuFromSequence();
+    SynchToCurrentTime();
+  }
+}
+
+void TrackMenuParameter::ListenToSequence() {
+  if (GetSequence() && mSequenceStation.empty()) {
+    mSequenceStation = GetSequence()->GetStation();
+    AddListener(mSequenceStation, *this);
+  }
+}
+
+void TrackMenuParameter::StopListeningToSequence() {
   if (!mSequenceStation.empty()) {
     RemoveListener(mSequenceStation, *this);
     mSequenceStation.clear();
   }
-  DestroyControl(mPopup);
 }
 
 void TrackMenuParameter::ShowControls(bool show) {

@@ -27,6 +27,10 @@ class TrackMenuParameter : public ParameterControl {
   void ListenToMessage(const Message& message) override;
   void PositionSelf(int top, int depth, int width) override;
   void SynchToCurrentTime() override;
+  // Follows the new binding's sequence: its structure changes and its tracks.
+  void UpdateParamBinding(const SequenceRef& sequence, const ComponentRef& component,
+                          const ComponentParamRef& param, const TrackItemRef& trackItem,
+                          const StationName& playerStation = {}) override;
 
   bool FindCommandStatus(CommandID command, CommandStatus& status) override;
   bool ObeyCommand(CommandID command) override;
@@ -50,6 +54,9 @@ class TrackMenuParameter : public ParameterControl {
 
  private:
   void RebuildMenuFromSequence();
+  // Listens to the bound sequence's station only (none without a sequence).
+  void ListenToSequence();
+  void StopListeningToSequence();
   void Choose(CommandID command);
 
   std::shared_ptr<TextPopup> mPopup;

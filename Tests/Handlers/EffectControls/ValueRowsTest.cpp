@@ -292,6 +292,24 @@ TEST_F(ValueRowTest, ATrackMenuFollowsTracksAddedToTheSequence) {
   EXPECT_EQ(popup.GetItem(4).command, 18604);
 }
 
+TEST_F(ValueRowTest, AReboundTrackMenuFollowsItsNewSequence) {
+  auto row = Make<TrackMenuParameter>(kMatchName_MatteFromTrack, "Matte");
+  const SequenceRef other = builder.AddSequence("Other");
+  const TrackRef only = builder.AddTrack(other, MediaType::Video, "Only");
+  const TrackItemRef otherClip = builder.AddClip(only, nullptr, {.start = 0, .end = kSec});
+  const ComponentRef matte = builder.AddEffect(otherClip, kMatchName_MatteFromTrack);
+  row->UpdateParamBinding(other, matte, matte->FindParam("Matte"), otherClip);
+  TextPopup& popup = *row->GetPopup();
+  ASSERT_EQ(popup.GetItemCount(), 3);
+  EXPECT_EQ(popup.GetItem(2).text, "Only");
+  // The first sequence no longer reaches the row; the new one does.
+  builder.AddTrack(sequence, MediaType::Video, "V3");
+  EXPECT_EQ(popup.GetItemCount(), 3);
+  builder.AddTrack(other, MediaType::Video, "Second");
+  ASSERT_EQ(popup.GetItemCount(), 4);
+  EXPECT_EQ(popup.GetItem(3).text, "Second");
+}
+
 // --- Opaque ---
 
 TEST_F(ValueRowTest, AnOpaqueRowHasAStopwatchAndNoControl) {
