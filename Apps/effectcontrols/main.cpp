@@ -14,6 +14,7 @@
 #include "Apps/effectcontrols/EmbeddedDemoProject.h"
 #include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessageLoop.h"
+#include "Host/Messaging/Preferences.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ModelMessages.h"
 #include "Host/Model/Project.h"
@@ -115,6 +116,7 @@ int Run(const ProgramOptions& options) {
   if (project == nullptr)
     return Fail(kExitCannotStart, error);
 
+  options.ApplyPreferences(Preferences::Application().Properties());
   Application application(options.size);
   application.LoadModules();
   application.CreateHandlers();

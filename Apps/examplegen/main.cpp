@@ -127,6 +127,20 @@ ProjectRef BuildDemo() {
       graphic->GetComponentChain(),
       GraphicsLayer("Subtitle", "Summer on the coast", {960.0, 950.0}, {1.0f, 1.0f, 1.0f, 1.0f}));
 
+  // Made after everything above, so the ids scripts use stay where they were: a clip whose
+  // effects show the timecode, button, track-menu and opaque rows, and whose Rotation keeps two
+  // whole turns.
+  auto effectsClip =
+      b.AddClip(v2, beach, {.start = Seconds(10), .end = Seconds(15), .mediaIn = Seconds(20)});
+  b.AddEffect(effectsClip, kMatchName_Timecode);
+  b.AddEffect(effectsClip, kMatchName_GridDistortion);
+  b.AddEffect(effectsClip, kMatchName_MatteFromTrack);
+  const ComponentParamRef rotation =
+      effectsClip->GetComponentChain()->FindByMatchName(kMatchName_Motion)->FindParam("Rotation");
+  ComponentParam::State turned = rotation->GetState();
+  turned.value = 720.0;
+  rotation->ApplyState(turned);
+
   Markers markers;
   markers.Add({Seconds(4), 0, "Cut here?", "", 1});
   markers.Add({Seconds(12), Seconds(2), "Music swell", "", 4});

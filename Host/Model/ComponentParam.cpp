@@ -61,6 +61,8 @@ ComponentParamRef ComponentParam::Clone() const {
   copy->mMenuEntries = mMenuEntries;
   copy->mDisablesWhenOn = mDisablesWhenOn;
   copy->mCanVary = mCanVary;
+  copy->mTimebase = mTimebase;
+  copy->mCheckboxName = mCheckboxName;
   copy->mAudioGain = mAudioGain;
   copy->mVisible = mVisible;
   copy->mEnabled = mEnabled;
@@ -157,6 +159,18 @@ ComponentParamRef ComponentParam::SetDisablesWhenOn(std::vector<std::string> nam
 
 ComponentParamRef ComponentParam::SetCanVaryOverTime(bool can) {
   mCanVary = can;
+  return ComponentParamRef(this);
+}
+
+ComponentParamRef ComponentParam::SetParameterTimebase(FrameRate timebase) {
+  if (timebase.IsValid() && !timebase.IsAudio()) {
+    mTimebase = timebase;
+  }
+  return ComponentParamRef(this);
+}
+
+ComponentParamRef ComponentParam::SetCheckboxDisplayName(std::string name) {
+  mCheckboxName = std::move(name);
   return ComponentParamRef(this);
 }
 

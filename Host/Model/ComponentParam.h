@@ -10,6 +10,7 @@
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
 #include "Host/Model/ParamValue.h"
+#include "Host/Time/FrameRate.h"
 #include "Host/Time/TickTime.h"
 
 // One parameter of a component. Its value is either constant, or, while it varies over time
@@ -64,6 +65,13 @@ class ComponentParam : public ModelObject {
   double GetStep() const { return mStep; }
   const std::vector<std::string>& GetMenuEntries() const { return mMenuEntries; }
   bool CanVaryOverTime() const { return mCanVary; }
+  // The frame rate a timecode parameter counts whole frames in; nullopt: any tick.
+  const std::optional<FrameRate>& GetParameterTimebase() const { return mTimebase; }
+  // The label of a button parameter's button; the display name when none was given.
+  const std::string& GetCheckboxDisplayName() const {
+    return mCheckboxName.empty() ? mName : mCheckboxName;
+  }
+  bool HasCheckboxDisplayName() const { return !mCheckboxName.empty(); }
 
   // Building (before the parameter is used). The range also sets the slider range when that was
   // not set; the default value is limited to the range.
@@ -76,6 +84,9 @@ class ComponentParam : public ModelObject {
   ComponentParamRef SetGroupKind(GroupKind kind);
   ComponentParamRef SetMenuEntries(std::vector<std::string> entries);
   ComponentParamRef SetCanVaryOverTime(bool can);
+  // An invalid or audio rate is ignored.
+  ComponentParamRef SetParameterTimebase(FrameRate timebase);
+  ComponentParamRef SetCheckboxDisplayName(std::string name);
   // A gain: the value is linear (1.0 leaves the level as it is, 0 silences) and is presented and
   // dragged in decibels. Only number parameters can be gains; others keep false. Parameters
   // made with the old gain type code (17) are gains.
@@ -153,6 +164,8 @@ class ComponentParam : public ModelObject {
   std::vector<std::string> mMenuEntries;
   std::vector<std::string> mDisablesWhenOn;
   bool mCanVary = true;
+  std::optional<FrameRate> mTimebase;
+  std::string mCheckboxName;
   bool mAudioGain = false;
   bool mVisible = true;
   bool mEnabled = true;

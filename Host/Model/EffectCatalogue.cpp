@@ -187,6 +187,7 @@ ComponentRef Timecode() {
   // Ticks, held as a double: exact below about 9.8 hours.
   effect->AddParam(ComponentParam::Create("Starting Timecode", ParamType::Timecode, 0.0)
                        ->SetRange(0.0, 9.0e15)
+                       ->SetParameterTimebase(kFrameRate_25)
                        ->SetCanVaryOverTime(false));
   effect->AddParam(Scalar("Offset", 0.0, -100.0, 100.0, 0, ParamUnits::None, ParamType::Slider));
   return effect;
@@ -197,13 +198,25 @@ ComponentRef GridDistortion() {
       MakeEffect(kMatchName_GridDistortion, "Grid Distortion", MediaType::Video, false);
   effect->SetHasSetupDialog(true);
   effect->AddParam(ComponentParam::Create("Grid", ParamType::Custom, ParamBlob{}));
-  effect->AddParam(
-      ComponentParam::Create("Reset Grid", ParamType::Button, false)->SetCanVaryOverTime(false));
+  effect->AddParam(ComponentParam::Create("Reset Grid", ParamType::Button, false)
+                       ->SetCheckboxDisplayName("Reset")
+                       ->SetCanVaryOverTime(false));
   // A counted group: its value lists the parameters it spans, one per semicolon.
   effect->AddParam(Group("Advanced", GroupKind::Counted, TextBlob("Smoothness;Settings;")));
   effect->AddParam(Scalar("Smoothness", 0.5, 0.0, 1.0, 2, ParamUnits::None, ParamType::DoubleSlider)
                        ->SetStep(0.01));
   effect->AddParam(ComponentParam::Create("Settings", ParamType::Opaque, ParamBlob{}));
+  return effect;
+}
+
+// Keys the clip with the picture of another video track; the choice is an index into the
+// sequence's track-menu strings (Sequence::GetTrackComboParamStrings).
+ComponentRef MatteFromTrack() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_MatteFromTrack, "Matte From Track", MediaType::Video, false);
+  effect->AddParam(ComponentParam::Create("Matte", ParamType::TrackMenu, ParamChoice{0}));
+  effect->AddParam(Menu("Composite Using", {"Matte Alpha", "Matte Luma"}, false));
+  effect->AddParam(Check("Reverse", false));
   return effect;
 }
 
@@ -256,9 +269,9 @@ ComponentRef Mask() {
 
 EffectCatalogue MakeStandard() {
   EffectCatalogue catalogue;
-  for (ComponentRef effect :
-       {Motion(), Opacity(), TimeRemapping(), Volume(), ChannelVolume(), Panner(), GaussianBlur(),
-        BrightnessContrast(), Crop(), Tint(), Timecode(), GridDistortion(), Delay(), Mask()}) {
+  for (ComponentRef effect : {Motion(), Opacity(), TimeRemapping(), Volume(), ChannelVolume(),
+                              Panner(), GaussianBlur(), BrightnessContrast(), Crop(), Tint(),
+                              Timecode(), GridDistortion(), Delay(), Mask(), MatteFromTrack()}) {
     catalogue.Register(std::move(effect));
   }
   DescribeAudioParams(catalogue);

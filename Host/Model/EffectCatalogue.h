@@ -24,6 +24,7 @@ inline constexpr const char* kMatchName_Timecode = "XO.KRVN Timecode";
 inline constexpr const char* kMatchName_GridDistortion = "XO.KRVN GridDistortion";
 inline constexpr const char* kMatchName_Delay = "XO.KRVN Delay";
 inline constexpr const char* kMatchName_Mask = "XO.KRVN Mask";
+inline constexpr const char* kMatchName_MatteFromTrack = "XO.KRVN MatteFromTrack";
 
 // Positions (from 0) of the mask parameters the tracker works with.
 inline constexpr std::size_t kMaskParamPath = 6;

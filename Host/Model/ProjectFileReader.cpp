@@ -395,6 +395,14 @@ class Loader {
         node.Fail("time displays do not suit the frame rates");
       }
     }
+    if (node.Has("frameSize")) {
+      const auto sizeNode = node.Member("frameSize");
+      const auto sides = sizeNode.Elements();
+      if (sides.size() != 2)
+        sizeNode.Fail("needs [width, height]");
+      sequence->SetFrameSize(
+          {sides[0].IntIn(1, Sequence::kMaxFrameSide), sides[1].IntIn(1, Sequence::kMaxFrameSide)});
+    }
     sequence->SetAudioFrameAligned(node.Bool("audioFrameAligned", false));
     sequence->SetZeroPoint(node.Time("zeroPoint", 0));
     sequence->SetInPoint(node.Has("in") ? node.Member("in").OptionalTime() : std::nullopt);
@@ -654,6 +662,15 @@ class Loader {
       param->SetMenuEntries(std::move(entries));
     }
     param->SetCanVaryOverTime(node.Bool("canVary", true));
+    if (node.Has("timebase")) {
+      const auto timebaseNode = node.Member("timebase");
+      const FrameRate timebase = LoadFrameRate(timebaseNode);
+      if (timebase.IsAudio())
+        timebaseNode.Fail("must be a video frame rate");
+      param->SetParameterTimebase(timebase);
+    }
+    if (node.Has("checkboxName"))
+      param->SetCheckboxDisplayName(node.Member("checkboxName").String());
     if (node.Bool("audioGain", oldGainType)) {
       if (param->GetValueKind() != ParamValueKind::Double) {
         (node.Has("audioGain") ? node.Member("audioGain") : typeNode)

@@ -102,29 +102,37 @@ json SaveParam(const ComponentParam& p) {
   for (const auto& k : p.GetKeyframes().Keyframes()) {
     keyframes.push_back(SaveKeyframe(k));
   }
-  return {{"id", p.GetID()},
-          {"name", p.GetName()},
-          {"type", p.GetTypeCode()},
-          {"groupKind", p.GetGroupKindCode()},
-          {"default", SaveValue(p.GetDefaultValue())},
-          {"min", p.GetMinimum()},
-          {"max", p.GetMaximum()},
-          {"sliderMin", p.GetSliderMinimum()},
-          {"sliderMax", p.GetSliderMaximum()},
-          {"precision", p.GetPrecision()},
-          {"exponent", p.GetExponent()},
-          {"units", p.GetUnitsCode()},
-          {"step", p.GetStep()},
-          {"menu", p.GetMenuEntries()},
-          {"canVary", p.CanVaryOverTime()},
-          {"audioGain", p.IsAudioGain()},
-          {"disablesWhenOn", p.GetDisablesWhenOn()},
-          {"visible", p.IsVisible()},
-          {"enabled", p.IsEnabled()},
-          {"readOnly", p.IsReadOnly()},
-          {"value", SaveValue(p.GetConstantValue())},
-          {"timeVarying", p.IsTimeVarying()},
-          {"keyframes", keyframes}};
+  json param = {{"id", p.GetID()},
+                {"name", p.GetName()},
+                {"type", p.GetTypeCode()},
+                {"groupKind", p.GetGroupKindCode()},
+                {"default", SaveValue(p.GetDefaultValue())},
+                {"min", p.GetMinimum()},
+                {"max", p.GetMaximum()},
+                {"sliderMin", p.GetSliderMinimum()},
+                {"sliderMax", p.GetSliderMaximum()},
+                {"precision", p.GetPrecision()},
+                {"exponent", p.GetExponent()},
+                {"units", p.GetUnitsCode()},
+                {"step", p.GetStep()},
+                {"menu", p.GetMenuEntries()},
+                {"canVary", p.CanVaryOverTime()},
+                {"audioGain", p.IsAudioGain()},
+                {"disablesWhenOn", p.GetDisablesWhenOn()},
+                {"visible", p.IsVisible()},
+                {"enabled", p.IsEnabled()},
+                {"readOnly", p.IsReadOnly()},
+                {"value", SaveValue(p.GetConstantValue())},
+                {"timeVarying", p.IsTimeVarying()},
+                {"keyframes", keyframes}};
+  // Only the parameters that have them, so other parameters read as they always did.
+  if (p.GetParameterTimebase()) {
+    param["timebase"] = SaveFrameRate(*p.GetParameterTimebase());
+  }
+  if (p.HasCheckboxDisplayName()) {
+    param["checkboxName"] = p.GetCheckboxDisplayName();
+  }
+  return param;
 }
 
 json SaveComponent(const Component& c) {
@@ -246,6 +254,7 @@ json SaveSequence(const Sequence& s) {
           {"audioFrameRate", SaveFrameRate(s.GetAudioFrameRate())},
           {"videoTimeDisplay", SaveFrameRate(s.GetVideoTimeDisplay())},
           {"audioTimeDisplay", SaveFrameRate(s.GetAudioTimeDisplay())},
+          {"frameSize", json::array({s.GetFrameSize().width, s.GetFrameSize().height})},
           {"audioFrameAligned", s.IsAudioFrameAligned()},
           {"zeroPoint", s.GetZeroPoint()},
           {"in", TimeOrNull(s.GetInPoint())},

@@ -82,6 +82,18 @@ bool Sequence::SetTimeDisplays(FrameRate videoDisplay, FrameRate audioDisplay) {
   return true;
 }
 
+bool Sequence::SetFrameSize(FrameSize size) {
+  const auto valid = [](int side) { return side >= 1 && side <= kMaxFrameSide; };
+  if (!valid(size.width) || !valid(size.height)) {
+    return false;
+  }
+  if (size != mFrameSize) {
+    mFrameSize = size;
+    NotifySettingsChanged();
+  }
+  return true;
+}
+
 void Sequence::SetAudioFrameAligned(bool aligned) {
   if (aligned == mAudioFrameAligned) {
     return;
@@ -283,4 +295,12 @@ Sequence::ScopedChangeBatch::~ScopedChangeBatch() {
   if (--mSequence->mBatchDepth == 0) {
     mSequence->FlushChanges();
   }
+}
+
+std::vector<std::string> Sequence::GetTrackComboParamStrings() const {
+  std::vector<std::string> strings{"None", "(-"};
+  for (const TrackRef& track : mVideoTracks) {
+    strings.push_back(track->GetName().empty() ? "~" : track->GetName());
+  }
+  return strings;
 }

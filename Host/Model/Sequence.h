@@ -33,6 +33,14 @@ inline constexpr const char* kPropertyKey_FrameAlignment = "MZ.FrameAlignment";
 // not edits and have no undo.
 class Sequence : public ModelObject {
  public:
+  // The size of the sequence's video frames, in pixels.
+  struct FrameSize {
+    int width = 1920;
+    int height = 1080;
+    friend bool operator==(const FrameSize&, const FrameSize&) = default;
+  };
+  static constexpr int kMaxFrameSide = 16384;
+
   static SequenceRef Create(std::string name, FrameRate videoRate = kFrameRate_25,
                             FrameRate audioRate = kFrameRate_Audio48000);
   ~Sequence() override;
@@ -48,6 +56,10 @@ class Sequence : public ModelObject {
   // Invalid rates are refused. SequenceSettingsChangedMessage.
   bool SetFrameRates(FrameRate videoRate, FrameRate audioRate);
   bool SetTimeDisplays(FrameRate videoDisplay, FrameRate audioDisplay);
+
+  const FrameSize& GetFrameSize() const { return mFrameSize; }
+  // Sides from 1 to kMaxFrameSide; others are refused. SequenceSettingsChangedMessage.
+  bool SetFrameSize(FrameSize size);
 
   // True: times align to audio samples; false: to video frames.
   bool IsAudioFrameAligned() const { return mAudioFrameAligned; }
@@ -85,6 +97,10 @@ class Sequence : public ModelObject {
   TrackItemRef FindTrackItem(ObjectID id) const;
   // Every item, video tracks first, each track's items in time order.
   void ForEachTrackItem(const std::function<void(const TrackItemRef&)>& visit) const;
+  // The entries a track-menu parameter offers, in value order: "None", a separator ("(-"), then
+  // the video tracks by name from the top. A track without a name is listed as "~" (no entry, but
+  // it keeps its value). Rebuilt by the rows on every structure change.
+  std::vector<std::string> GetTrackComboParamStrings() const;
 
   // The selection as groups of linked items. SetSelection takes items and groups each with the
   // items linked to it (one group per link group; an unlinked item is a group of its own);
@@ -126,6 +142,7 @@ class Sequence : public ModelObject {
   FrameRate mAudioRate;
   FrameRate mVideoDisplay;
   FrameRate mAudioDisplay;
+  FrameSize mFrameSize;
   bool mAudioFrameAligned = false;
   TickTime mZeroPoint = 0;
   std::optional<TickTime> mInPoint;

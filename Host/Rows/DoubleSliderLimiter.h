@@ -5,9 +5,9 @@
 #include "Host/Rows/Limiter.h"
 
 // A limiter whose bounds come from a range control's current handle values: for each handle a
-// lower bound L and an upper bound U. A value below L becomes L, one above U becomes U (L wins
-// when the bounds cross, so a handle never leaves its lower neighbour behind). Subclasses name
-// the bounds of each handle they answer for.
+// lower bound L and an upper bound U. A value below L becomes L, else one above U becomes U.
+// When the bounds cross (L > U) no value passes unchanged: one below L becomes L and any other
+// becomes U. Subclasses name the bounds of each handle they answer for.
 class DoubleSliderLimiter : public Limiter {
  public:
   struct Bounds {

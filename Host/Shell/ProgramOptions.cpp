@@ -3,6 +3,8 @@
 #include <charconv>
 #include <optional>
 
+#include "Host/Messaging/PropertyList.h"
+
 namespace {
 
 constexpr int kMaxSide = 16384;
@@ -45,6 +47,19 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
       (name == "--headless" ? options.headless : options.help) = true;
       continue;
     }
+    if (name == "--pref") {
+      std::string_view value;
+      if (inlineValue) {
+        value = *inlineValue;
+      } else if (i + 1 < arguments.size()) {
+        value = arguments[++i];
+      }
+      const auto equals = value.find('=');
+      if (equals == std::string_view::npos || equals == 0)
+        return "--pref needs KEY=VALUE, not '" + std::string(value) + "'";
+      options.preferences.emplace_back(value.substr(0, equals), value.substr(equals + 1));
+      continue;
+    }
     bool* seen = name == "--project"  ? &sawProject
                  : name == "--size"   ? &sawSize
                  : name == "--script" ? &sawScript
@@ -85,13 +100,15 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
 
 std::string ProgramOptions::Usage() {
   return "usage: effectcontrols [--project FILE] [--size WxH] [--script FILE] [--out DIR] "
-         "[--headless]\n"
+         "[--headless] [--pref KEY=VALUE]...\n"
          "  --project FILE  project to open and save with Ctrl+S; a new one when FILE does not\n"
          "                  exist yet (default: the built-in demo project, saved where asked)\n"
          "  --size WxH      workspace (window) size in pixels (default 960x540)\n"
          "  --script FILE   automation script to run; shots and dumps go under --out\n"
          "  --out DIR       folder for shots, dumps and saves (default: the current folder)\n"
          "  --headless      never open a window, even with a display\n"
+         "  --pref KEY=VALUE  set a preference before the panels open (true/false, a number or\n"
+         "                  text), e.g. effect.controls.own.slider.rows=true for slider rows\n"
          "Script lines (one a line, '#' comments; coordinates are panel pixels):\n"
          "  select ID... | select-none | time TICKS|hh:mm:ss:ff\n"
          "  click|rclick|dblclick X Y [shift] [ctrl] [alt] | drag X1 Y1 X2 Y2 [steps N] [mods]\n"
@@ -99,4 +116,24 @@ std::string ProgramOptions::Usage() {
          "  command ID-or-NAME | menu-answer ID-or-NAME|none | input-answer TEXT\n"
          "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE (a copy)\n"
          "  close (as the window's close button: asks to save changes; ends the script)\n";
+}
+
+void ProgramOptions::ApplyPreferences(PropertyList& properties) const {
+  for (const auto& [key, text] : preferences) {
+    if (properties.IsReadOnly(key)) {
+      continue;
+    }
+    if (text == "true" || text == "false") {
+      properties.SetBool(key, text == "true");
+      continue;
+    }
+    int number = 0;
+    const char* end = text.data() + text.size();
+    const auto [ptr, ec] = std::from_chars(text.data(), end, number);
+    if (!text.empty() && ec == std::errc() && ptr == end) {
+      properties.SetInt(key, number);
+    } else {
+      properties.SetString(key, text);
+    }
+  }
 }

@@ -110,6 +110,7 @@ constexpr CommandEntry kCommands[] = {
     {"cmd.effectcontrols.masterclipvideoexpander", 18498, 3, ""},
     {"cmd.effectcontrols.masterclipaudioexpander", 19000, 3, ""},
     {"cmd.effectcontrols.xoeditabletextexpander", 19050, 3, ""},
+    {"cmd.effectcontrols.own.slider.rows", 18055, 0, ""},
 };
 
 // The keyframe glyphs are one run of the decal list, already in image-list order.

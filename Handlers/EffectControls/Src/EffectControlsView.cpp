@@ -42,6 +42,9 @@ EffectControlsView::EffectControlsView(Commander* parent, std::string contextNam
   mHeader = std::make_shared<EffectControlsListHeader>(this);
   mListView = std::make_shared<EffectControlsListView>(this, mStation, mTimeline);
   mListView->SetEffectControlsView(this);
+  if (Preferences::Application().Properties().GetBool(kOwnSliderRowsKey, false)) {
+    mListView->SetStyle(mListView->GetStyle() | kStyleOwnSliderRows);
+  }
   mKeyframeView = std::make_shared<EffectControlsKeyframeView>(this);
   mKeyframeView->SetListView(mListView);
   mKeyframeView->SetTimeline(mTimeline);
@@ -405,4 +408,9 @@ void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.extra.emplace_back("rulerZoomOut", static_cast<std::int64_t>(mRuler->GetZoomOutTime()));
   dump.extra.emplace_back("audioTimeUnits", mAudioTimeUnits);
   dump.extra.emplace_back("masterClipTargeted", GetMasterClip() != nullptr);
+  // Where the list lies in the panel, so a script can turn a row's top into a click.
+  const Rect list = mListView->GetBounds();
+  dump.extra.emplace_back("listLeft", static_cast<std::int64_t>(list.left));
+  dump.extra.emplace_back("listTop", static_cast<std::int64_t>(list.top));
+  dump.extra.emplace_back("listWidth", static_cast<std::int64_t>(list.Width()));
 }

@@ -88,6 +88,10 @@ class EffectControlsView : public TabView,
   static constexpr int kAudioTimeUnitsCommand = 18052;
   static constexpr int kPinToClipCommand = 18053;
   static constexpr int kRulerNumbersCommand = 18054;
+  // Switches the list between the host's angle and point rows and the panel's slider rows; the
+  // choice is kept in the preference kOwnSliderRowsKey.
+  static constexpr int kOwnSliderRowsCommand = 18055;
+  static constexpr std::string_view kOwnSliderRowsKey = "effect.controls.own.slider.rows";
   static constexpr int kResetEffectCommand = 18300;
   static constexpr int kPlayAudioCommand = 18550;
   static constexpr int kDeleteAllEffectsCommand = 11541;
@@ -280,6 +284,9 @@ class EffectControlsView : public TabView,
   void SetShownRange(TickTime start, TickTime end);
   void UpdateAudioButtons();
   void SetAudioTimeUnits(bool audioUnits);
+  // Rebuilds the list with or without the panel's own slider rows and keeps the choice.
+  void SetOwnSliderRows(bool own);
+  bool HasOwnSliderRows() const;
   void RenameSelectedEffect();
   void SavePreset();
   // Moves the edit line: the timeline, the ruler, the time field and the sequence.

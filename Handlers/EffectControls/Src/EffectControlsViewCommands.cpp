@@ -214,6 +214,10 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
       status.enabled = true;
       status.checked = mRuler->AreNumbersShown();
       return true;
+    case kOwnSliderRowsCommand:
+      status.enabled = true;
+      status.checked = HasOwnSliderRows();
+      return true;
     case kLoopAudioCommand:
       status.enabled = mLoopButton && mLoopButton->IsEnabled();
       status.checked = mAudioLoop;
@@ -328,6 +332,9 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
       return true;
     case kRulerNumbersCommand:
       mRuler->SetShowNumbers(!mRuler->AreNumbersShown());
+      return true;
+    case kOwnSliderRowsCommand:
+      SetOwnSliderRows(!HasOwnSliderRows());
       return true;
     case kLoopAudioCommand:
       mAudioLoop = !mAudioLoop;

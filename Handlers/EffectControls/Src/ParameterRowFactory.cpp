@@ -6,8 +6,15 @@
 #include <typeinfo>
 #include <utility>
 
+#include "Handlers/EffectControls/Src/AngleSliderParameter.h"
 #include "Handlers/EffectControls/Src/AudioFloatSliderParameter.h"
+#include "Handlers/EffectControls/Src/ButtonParameter.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Handlers/EffectControls/Src/OpaqueParameter.h"
+#include "Handlers/EffectControls/Src/PointSliderParameter.h"
+#include "Handlers/EffectControls/Src/TimecodeParameter.h"
+#include "Handlers/EffectControls/Src/TrackMenuParameter.h"
+#include "Handlers/EffectControls/Src/VideoFloatSliderParameter.h"
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Model/Component.h"
 #include "Host/Model/ComponentParam.h"
@@ -18,7 +25,6 @@
 #include "Host/Rows/ColorPickerParameter.h"
 #include "Host/Rows/DoubleSliderParameter.h"
 #include "Host/Rows/EffectItem.h"
-#include "Host/Rows/FloatSliderParameter.h"
 #include "Host/Rows/GroupBeginParameter.h"
 #include "Host/Rows/InfoParameter.h"
 #include "Host/Rows/LinkedPointPickerParameter.h"
@@ -135,14 +141,12 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
       if (audio) {
         rows.push_back(std::make_shared<AudioFloatSliderParameter>(info));
       } else {
-        rows.push_back(HostRowStandIn<FloatSliderParameter>("VideoFloatSliderParameter",
-                                                            "FloatSliderParameter", info));
+        rows.push_back(std::make_shared<VideoFloatSliderParameter>(info));
       }
       break;
     case ParamType::Angle:
       if (ownSliderRows) {
-        rows.push_back(
-            HostRowStandIn<AngleParameter>("AngleSliderParameter", "AngleParameter", info));
+        rows.push_back(std::make_shared<AngleSliderParameter>(info));
       } else {
         rows.push_back(std::make_shared<AngleParameter>(info));
       }
@@ -161,8 +165,10 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
     case ParamType::Point:
       if (ownSliderRows) {
         // One row per coordinate: horizontal, then vertical.
-        rows.push_back(ValueStandIn("PointSliderParameter", info));
-        rows.push_back(ValueStandIn("PointSliderParameter", info));
+        rows.push_back(
+            std::make_shared<PointSliderParameter>(info, PointSliderParameter::Coordinate::X));
+        rows.push_back(
+            std::make_shared<PointSliderParameter>(info, PointSliderParameter::Coordinate::Y));
       } else if (info.component && info.component->IsCapsule()) {
         rows.push_back(std::make_shared<LinkedPointPickerParameter>(info, IsTemplateScale(info)));
       } else {
@@ -183,16 +189,16 @@ std::vector<std::shared_ptr<ParameterControl>> ParameterRowFactory::CreateParame
                                   info));
       break;
     case ParamType::TrackMenu:
-      rows.push_back(ValueStandIn("TrackMenuParameter", info));
+      rows.push_back(std::make_shared<TrackMenuParameter>(info));
       break;
     case ParamType::Timecode:
-      rows.push_back(ValueStandIn("TimecodeParameter", info));
+      rows.push_back(std::make_shared<TimecodeParameter>(info));
       break;
     case ParamType::Button:
-      rows.push_back(ValueStandIn("ButtonParameter", info));
+      rows.push_back(std::make_shared<ButtonParameter>(info));
       break;
     case ParamType::Opaque:
-      rows.push_back(ValueStandIn("OpaqueParameter", info));
+      rows.push_back(std::make_shared<OpaqueParameter>(info));
       break;
     case ParamType::Text:
       rows.push_back(std::make_shared<TextParameter>(info, request.textEditable));

@@ -45,7 +45,7 @@ struct ParameterRowRequest {
 //
 // Until a row class exists, the nearest host row stands in for it and answers, through
 // GetRowClassName, "<class the panel means> (host <class made>)", e.g.
-// "VideoFloatSliderParameter (host InfoParameter)", so that a dump shows what each row is meant
+// "CustomParameter (host InfoParameter)", so that a dump shows what each row is meant
 // to be. Rows are returned constructed, not finished: the list sets the group level, finishes,
 // sets aside and adopts them. UI thread only.
 class ParameterRowFactory {
@@ -81,6 +81,6 @@ class ParameterRowFactory {
                                                               const TrackItemRef& transition);
 
   // The class a row stands for, as the dump shows it: "FilterItem", "CheckboxParameter",
-  // "VideoFloatSliderParameter (host InfoParameter)"; the C++ class name for other rows.
+  // "CustomParameter (host InfoParameter)"; the C++ class name for other rows.
   static std::string GetRowClassName(const EffectItem& row);
 };

@@ -127,7 +127,7 @@ TEST(EffectControlsCommands, AreDeclaredInTheirOrderWithKindAndShortcutLabel) {
       18001, 18002, 18003, 57632, 11541, 18006, 18007, 18008, 18009, 18010, 18011,
       18012, 18013, 18052, 18054, 18051, 18053, 18401, 18402, 18403, 18404, 18405,
       18406, 18407, 18408, 18409, 18410, 18411, 18461, 18462, 18463, 18464, 18471,
-      18472, 18473, 18474, 18420, 18500, 18499, 18498, 19000, 19050};
+      18472, 18473, 18474, 18420, 18500, 18499, 18498, 19000, 19050, 18055};
   std::vector<CommandID> order;
   for (const CommandDeclaration& command : context->GetCommands()) {
     order.push_back(command.id);
@@ -163,7 +163,7 @@ TEST(EffectControlsCommands, DeclaringTwiceChangesNothing) {
   ShortcutManager shortcuts;
   EffectControlsHandler::SetUpCommandContext(shortcuts);
   EffectControlsHandler::SetUpCommandContext(shortcuts);
-  EXPECT_EQ(shortcuts.FindContext("effectcontrols")->GetCommands().size(), 42u);
+  EXPECT_EQ(shortcuts.FindContext("effectcontrols")->GetCommands().size(), 43u);
 }
 
 // --- Keyframe images ---

@@ -178,8 +178,7 @@ TEST_F(ParameterRowFactoryTest, OnlyATemplatesScaleStartsLinked) {
   EXPECT_FALSE(linkedPosition->IsTemplateScale());
 }
 
-// Until the panel's own rows exist, numbers are edited by the host's rows: a typed value is one
-// undoable step.
+// A typed value is one undoable step.
 TEST_F(ParameterRowFactoryTest, AScalarRowEditsItsParameterAsOneUndoableStep) {
   ParameterRowRequest request = Request(video, ParamType::FloatSlider, 10.0);
   request.info.param->SetRange(0, 100);
@@ -203,11 +202,36 @@ TEST_F(ParameterRowFactoryTest, AGraphicsLayersCustomParameterIsAGraphicsRow) {
 }
 
 TEST_F(ParameterRowFactoryTest, AStandInSaysWhichHostRowItIs) {
-  const auto rows = ParameterRowFactory::CreateParameterRows(Request(video, ParamType::Button));
+  const auto rows = ParameterRowFactory::CreateParameterRows(Request(video, ParamType::Custom));
   ASSERT_EQ(rows.size(), 1u);
   const std::string name = ParameterRowFactory::GetRowClassName(*rows[0]);
-  EXPECT_EQ(name.rfind("ButtonParameter (host ", 0), 0u) << name;
+  EXPECT_EQ(name.rfind("CustomParameter (host ", 0), 0u) << name;
   EXPECT_EQ(name.back(), ')');
+}
+
+// The dump names these rows by their own classes: no host row stands in for them any more.
+TEST_F(ParameterRowFactoryTest, ValueParametersGetThePanelsOwnRowsAndNoStandIn) {
+  const auto exact = [this](ParameterRowRequest request) {
+    std::vector<std::string> names;
+    for (const auto& row : ParameterRowFactory::CreateParameterRows(request)) {
+      row->FinishCreateSelf();
+      made.push_back(row);
+      names.push_back(ParameterRowFactory::GetRowClassName(*row));
+    }
+    return names;
+  };
+  ParameterRowRequest angle = Request(video, ParamType::Angle);
+  angle.listStyle = ParameterRowFactory::kOwnSliderRowsStyle;
+  ParameterRowRequest point = Request(video, ParamType::Point, ParamPoint{1.0, 2.0});
+  point.listStyle = ParameterRowFactory::kOwnSliderRowsStyle;
+  EXPECT_EQ(exact(Request(video, ParamType::FloatSlider)), Names{"VideoFloatSliderParameter"});
+  EXPECT_EQ(exact(angle), Names{"AngleSliderParameter"});
+  EXPECT_EQ(exact(point), (Names{"PointSliderParameter", "PointSliderParameter"}));
+  EXPECT_EQ(exact(Request(video, ParamType::TrackMenu, ParamChoice{0})),
+            Names{"TrackMenuParameter"});
+  EXPECT_EQ(exact(Request(video, ParamType::Timecode)), Names{"TimecodeParameter"});
+  EXPECT_EQ(exact(Request(video, ParamType::Button, false)), Names{"ButtonParameter"});
+  EXPECT_EQ(exact(Request(video, ParamType::Opaque, ParamBlob{})), Names{"OpaqueParameter"});
 }
 
 TEST_F(ParameterRowFactoryTest, RowsKeepTheirBinding) {

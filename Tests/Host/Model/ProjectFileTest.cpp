@@ -298,3 +298,52 @@ TEST(ExampleProjects, TheDemoHoldsEveryCaseThePanelShows) {
 }
 
 }  // namespace
+
+namespace {
+
+// A button's label, a timecode's timebase and the sequence's frame size travel through the file;
+// parameters without them read as they always did.
+TEST_F(ProjectFileTest, FrameSizeTimebaseAndButtonLabelSurviveSaveAndLoad) {
+  sequence->SetFrameSize({1280, 720});
+  const ComponentRef timecode = Catalogue().Create(kMatchName_Timecode);
+  const ComponentRef grid = Catalogue().Create(kMatchName_GridDistortion);
+  videoChain->Append(timecode);
+  videoChain->Append(grid);
+  const std::string first = Saved();
+  const auto loaded = ProjectFile::LoadFromString(first);
+  ASSERT_TRUE(loaded) << loaded.error;
+  EXPECT_EQ(ProjectFile::SaveToString(*loaded.project), first);
+  const SequenceRef& reread = loaded.project->GetSequences().front();
+  EXPECT_EQ(reread->GetFrameSize(), (Sequence::FrameSize{1280, 720}));
+  const TrackItemRef item = reread->FindTrackItem(video->GetID());
+  ASSERT_NE(item, nullptr);
+  const ComponentRef rereadTimecode =
+      item->GetComponentChain()->FindByMatchName(kMatchName_Timecode);
+  ASSERT_NE(rereadTimecode, nullptr);
+  EXPECT_EQ(rereadTimecode->FindParam("Starting Timecode")->GetParameterTimebase(),
+            std::optional<FrameRate>(kFrameRate_25));
+  EXPECT_FALSE(rereadTimecode->FindParam("Offset")->GetParameterTimebase().has_value());
+  const ComponentRef rereadGrid =
+      item->GetComponentChain()->FindByMatchName(kMatchName_GridDistortion);
+  EXPECT_EQ(rereadGrid->FindParam("Reset Grid")->GetCheckboxDisplayName(), "Reset");
+  EXPECT_EQ(rereadGrid->FindParam("Settings")->GetCheckboxDisplayName(), "Settings");
+}
+
+TEST_F(ProjectFileTest, ABadFrameSizeOrAnAudioTimebaseIsRefused) {
+  ExpectLoadFails([](json& j) { j["sequences"][0]["frameSize"] = {1920}; },
+                  "sequences[0].frameSize: needs [width, height]");
+  ExpectLoadFails(
+      [](json& j) {
+        j["sequences"][0]["frameSize"] = {0, 1080};
+      },
+      "sequences[0].frameSize[0]: expected an integer from 1 to 16384");
+  ExpectLoadFails(
+      [](json& j) {
+        j["sequences"][0]["tracks"][0]["items"][0]["chain"]["components"][0]["params"][0]
+         ["timebase"] = {{"sampleRate", 48000}};
+      },
+      "sequences[0].tracks[0].items[0].chain.components[0].params[0].timebase: must be a video "
+      "frame rate");
+}
+
+}  // namespace

@@ -153,3 +153,23 @@ TEST_F(SequenceTest, AComponentOutlivingItsChainHasNoChain) {
 }
 
 }  // namespace
+
+namespace {
+
+TEST_F(SequenceTest, TheFrameSizeRefusesSidesOutsideItsRange) {
+  EXPECT_EQ(sequence->GetFrameSize(), (Sequence::FrameSize{1920, 1080}));
+  EXPECT_FALSE(sequence->SetFrameSize({0, 1080}));
+  EXPECT_FALSE(sequence->SetFrameSize({1920, Sequence::kMaxFrameSide + 1}));
+  EXPECT_EQ(sequence->GetFrameSize(), (Sequence::FrameSize{1920, 1080}));
+  EXPECT_TRUE(sequence->SetFrameSize({3840, 2160}));
+  EXPECT_EQ(sequence->GetFrameSize(), (Sequence::FrameSize{3840, 2160}));
+}
+
+TEST_F(SequenceTest, TrackMenuStringsListTheVideoTracksAfterNoneAndASeparator) {
+  EXPECT_EQ(sequence->GetTrackComboParamStrings(), (std::vector<std::string>{"None", "(-", "V1"}));
+  sequence->AddTrack(Track::Create(MediaType::Video, ""));
+  EXPECT_EQ(sequence->GetTrackComboParamStrings(),
+            (std::vector<std::string>{"None", "(-", "V1", "~"}));
+}
+
+}  // namespace

@@ -232,4 +232,19 @@ TEST(DoubleSliderLimiter, ClampsToTheHandlesBoundsAndSaysSo) {
   EXPECT_FALSE(clamped);
 }
 
+// Crossed bounds (L 30 > U 25): the lower bound is tested first, so it wins only below it; at
+// or above it the upper bound applies, and nothing passes unchanged.
+TEST(DoubleSliderLimiter, WithCrossedBoundsAValueNotBelowTheLowerBecomesTheUpper) {
+  RangeLimiter limiter;
+  bool clamped = false;
+  EXPECT_FLOAT_EQ(limiter.Limit(2, 30.0f, clamped), 25.0f);
+  EXPECT_TRUE(clamped);
+  clamped = false;
+  EXPECT_FLOAT_EQ(limiter.Limit(2, 40.0f, clamped), 25.0f);
+  EXPECT_TRUE(clamped);
+  clamped = false;
+  EXPECT_FLOAT_EQ(limiter.Limit(2, 29.0f, clamped), 30.0f);
+  EXPECT_TRUE(clamped);
+}
+
 }  // namespace

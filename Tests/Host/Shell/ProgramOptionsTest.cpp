@@ -3,6 +3,7 @@
 #include <initializer_list>
 #include <vector>
 
+#include "Host/Messaging/PropertyList.h"
 #include "Host/Shell/ProgramOptions.h"
 
 namespace {
@@ -34,6 +35,29 @@ TEST(ProgramOptions, ReadsEveryOptionInBothForms) {
   EXPECT_EQ(options.scriptPath, "s.txt");
   EXPECT_EQ(options.outDir, "o");
   EXPECT_TRUE(options.headless);
+}
+
+TEST(ProgramOptions, PreferencesAreSetAsFlagsNumbersOrTextAndTheLastWins) {
+  const auto options = std::get<ProgramOptions>(
+      ParseArgs({"--pref", "a.flag=true", "--pref=a.count=12", "--pref", "a.name=x=y", "--pref",
+                 "a.flag=false", "--pref", "a.locked=true", "--pref", "a.empty="}));
+  ASSERT_EQ(options.preferences.size(), 6u);
+  PropertyList properties;
+  properties.SetBool("a.locked", false);
+  properties.SetReadOnly("a.locked", true);
+  options.ApplyPreferences(properties);
+  EXPECT_EQ(properties.GetValue("a.flag"), PropertyList::Value(false));
+  EXPECT_EQ(properties.GetValue("a.count"), PropertyList::Value(12));
+  EXPECT_EQ(properties.GetValue("a.name"), PropertyList::Value(std::string("x=y")));
+  EXPECT_EQ(properties.GetValue("a.empty"), PropertyList::Value(std::string()));
+  EXPECT_FALSE(properties.GetBool("a.locked", true));
+}
+
+TEST(ProgramOptions, APreferenceNeedsAKey) {
+  EXPECT_EQ(ErrorOf(ParseArgs({"--pref", "novalue"})), "--pref needs KEY=VALUE, not 'novalue'");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--pref=", "x"})), "--pref needs KEY=VALUE, not ''");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--pref", "=1"})), "--pref needs KEY=VALUE, not '=1'");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--pref"})), "--pref needs KEY=VALUE, not ''");
 }
 
 TEST(ProgramOptions, RejectsMalformedSizes) {

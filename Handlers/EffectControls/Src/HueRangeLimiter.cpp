@@ -1,0 +1,4 @@
+#include "Handlers/EffectControls/Src/HueRangeLimiter.h"
+
+HueRangeLimiter::HueRangeLimiter(const HSLRangeValues* values)
+    : HSLRangeLimiter(values, kFirstHandle) {}

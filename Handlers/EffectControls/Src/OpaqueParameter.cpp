@@ -1,0 +1,3 @@
+#include "Handlers/EffectControls/Src/OpaqueParameter.h"
+
+OpaqueParameter::OpaqueParameter(const ParameterControlInfo& info) : ParameterControl(info) {}

@@ -1,0 +1,412 @@
+// Edits every kind of value row of the demo project in the program, in both row styles: the
+// host's angle and point rows, and the panel's own slider rows (the preference
+// "effect.controls.own.slider.rows"). A first run dumps the rows of the demo's effects clip;
+// the clicks of the second run are placed from that dump (the list's place in the panel, each
+// row's top and group level, and the rule that value controls start at the middle of the row
+// less 20 pixels). Each edit must be one undo step, and undoing them all must give back the
+// saved project byte for byte. The dump must name the panel's own row classes.
+//
+// Built with EC_PROGRAM (the effectcontrols executable), EC_EXAMPLES (the example projects, whose
+// demo.json is the program's built-in demo) and EC_OUT (where the runs write).
+#include <fcntl.h>
+#include <gtest/gtest.h>
+#include <spawn.h>
+#include <sys/wait.h>
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <nlohmann/json.hpp>
+#include <optional>
+#include <sstream>
+#include <string>
+#include <vector>
+
+extern char** environ;
+
+namespace {
+
+namespace fs = std::filesystem;
+using nlohmann::json;
+
+constexpr const char* kOwnRowsPreference = "effect.controls.own.slider.rows";
+constexpr const char* kSize = "1200x1400";
+constexpr int kIndentPerGroupLevel = 17;
+
+std::string ReadText(const fs::path& path) {
+  std::ifstream in(path, std::ios::binary);
+  return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+}
+
+json ReadJson(const fs::path& path) {
+  std::ifstream in(path);
+  return json::parse(in);
+}
+
+// The id of the demo's clip that carries Matte From Track (and with it the timecode, button and
+// opaque parameters).
+std::optional<long long> EffectsClipId() {
+  const json demo = ReadJson(fs::path(EC_EXAMPLES) / "demo.json");
+  for (const json& sequence : demo.at("sequences")) {
+    for (const json& track : sequence.at("tracks")) {
+      for (const json& item : track.at("items")) {
+        if (!item.contains("chain")) {
+          continue;
+        }
+        for (const json& component : item.at("chain").at("components")) {
+          if (component.value("matchName", "") == "XO.KRVN MatteFromTrack") {
+            return item.at("id").get<long long>();
+          }
+        }
+      }
+    }
+  }
+  return std::nullopt;
+}
+
+// The parameter `paramName` of the effect `matchName` on the track item `itemId` of a saved
+// project; null when there is none.
+const json* FindParam(const json& project, long long itemId, const char* matchName,
+                      const char* paramName) {
+  for (const json& sequence : project.at("sequences")) {
+    for (const json& track : sequence.at("tracks")) {
+      for (const json& item : track.at("items")) {
+        if (item.at("id").get<long long>() != itemId) {
+          continue;
+        }
+        for (const json& component : item.at("chain").at("components")) {
+          if (component.value("matchName", "") != matchName) {
+            continue;
+          }
+          for (const json& param : component.at("params")) {
+            if (param.value("name", "") == paramName) {
+              return &param;
+            }
+          }
+        }
+      }
+    }
+  }
+  return nullptr;
+}
+
+// Runs the program on the demo with `script`; false (with a failure) when it does not end well.
+bool RunProgram(const fs::path& out, const std::string& script, bool ownRows) {
+  const fs::path scriptPath = out / "script.ecs";
+  std::ofstream(scriptPath) << script;
+  const fs::path log = out / "run.log";
+  std::vector<std::string> args{
+      EC_PROGRAM, "--headless",
+      "--size",   kSize,
+      "--pref",   std::string(kOwnRowsPreference) + (ownRows ? "=true" : "=false"),
+      "--script", scriptPath.string(),
+      "--out",    out.string()};
+  std::vector<char*> argv;
+  for (std::string& arg : args) {
+    argv.push_back(arg.data());
+  }
+  argv.push_back(nullptr);
+  posix_spawn_file_actions_t actions;
+  posix_spawn_file_actions_init(&actions);
+  posix_spawn_file_actions_addopen(&actions, 1, log.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
+  posix_spawn_file_actions_adddup2(&actions, 1, 2);
+  pid_t pid = 0;
+  const int spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ);
+  posix_spawn_file_actions_destroy(&actions);
+  if (spawned != 0) {
+    ADD_FAILURE() << "cannot start " << EC_PROGRAM;
+    return false;
+  }
+  int status = 0;
+  waitpid(pid, &status, 0);
+  const std::string text = ReadText(log);
+  if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
+    ADD_FAILURE() << "the run in " << out << " failed (status " << status << ")\n" << text;
+    return false;
+  }
+  EXPECT_EQ(text.find("warning:"), std::string::npos) << "a click went nowhere:\n" << text;
+  return true;
+}
+
+const json& Panel(const json& dump) {
+  for (const json& panel : dump.at("panels")) {
+    if (panel.value("dumped", false)) {
+      return panel;
+    }
+  }
+  throw std::runtime_error("no panel dumped");
+}
+
+// A row of the dump by the last titles of its path; `nth` picks among rows of the same path.
+struct Row {
+  std::string className;
+  int top = 0;
+  int height = 0;
+  int groupLevel = 0;
+  bool shown = false;
+};
+
+std::optional<Row> FindRow(const json& panel, const std::vector<std::string>& pathEnd,
+                           int nth = 0) {
+  for (const json& row : panel.at("rows")) {
+    const auto path = row.at("path").get<std::vector<std::string>>();
+    if (path.size() < pathEnd.size() ||
+        !std::equal(pathEnd.rbegin(), pathEnd.rend(), path.rbegin())) {
+      continue;
+    }
+    if (nth-- > 0) {
+      continue;
+    }
+    return Row{row.at("class").get<std::string>(), row.at("top").get<int>(),
+               row.at("height").get<int>(), row.at("groupLevel").get<int>(),
+               row.at("shown").get<bool>()};
+  }
+  return std::nullopt;
+}
+
+// Where the list lies in the panel, from the view's facts.
+struct ListPlace {
+  int left = 0;
+  int top = 0;
+  int width = 0;
+};
+
+ListPlace PlaceOf(const json& panel) {
+  const json& extra = panel.at("extra");
+  return {extra.at("listLeft").get<int>(), extra.at("listTop").get<int>(),
+          extra.at("listWidth").get<int>()};
+}
+
+// Panel coordinates of a point `dx` into the row's value controls, halfway down its band.
+std::string ControlPoint(const ListPlace& list, const Row& row, int dx) {
+  const int controlsLeft = row.groupLevel * kIndentPerGroupLevel + list.width / 2 - 20;
+  std::ostringstream text;
+  text << list.left + controlsLeft + dx << " " << list.top + row.top + 10;
+  return text.str();
+}
+
+// The disclosure triangle at the row's indent + 3.
+std::string TrianglePoint(const ListPlace& list, const Row& row) {
+  std::ostringstream text;
+  text << list.left + row.groupLevel * kIndentPerGroupLevel + 3 + 5 << " "
+       << list.top + row.top + 10;
+  return text.str();
+}
+
+std::string StopwatchPoint(const ListPlace& list, const Row& row) {
+  std::ostringstream text;
+  text << list.left + row.groupLevel * kIndentPerGroupLevel + 20 + 8 << " "
+       << list.top + row.top + 10;
+  return text.str();
+}
+
+std::vector<std::string> UndoDone(const json& dump) {
+  return dump.at("undo").at("done").get<std::vector<std::string>>();
+}
+
+class ValueRowsProgram : public ::testing::TestWithParam<bool> {
+ protected:
+  void SetUp() override {
+    const auto id = EffectsClipId();
+    ASSERT_TRUE(id.has_value()) << "the demo has no clip with Matte From Track";
+    clipId = *id;
+    out = fs::path(EC_OUT) / (GetParam() ? "own-rows" : "host-rows");
+    fs::remove_all(out);
+    fs::create_directories(out / "layout");
+    fs::create_directories(out / "edits");
+  }
+
+  // Selects the clip at 11 s (inside it), opens the collapsed group that holds the opaque
+  // parameter, and dumps the rows; `opening` is set to the script lines that got there.
+  json Layout(std::string& opening) {
+    opening = "time 00:00:11:00\nselect " + std::to_string(clipId) + "\n";
+    if (!RunProgram(out / "layout", opening + "dump closed.json\n", GetParam())) {
+      return {};
+    }
+    const json closedDump = ReadJson(out / "layout" / "closed.json");
+    const json& closed = Panel(closedDump);
+    const auto group = FindRow(closed, {"Grid Distortion", "Advanced"});
+    if (!group) {
+      ADD_FAILURE() << "no Advanced group";
+      return {};
+    }
+    opening += "click " + TrianglePoint(PlaceOf(closed), *group) + "\n";
+    if (!RunProgram(out / "layout", opening + "dump rows.json\n", GetParam())) {
+      return {};
+    }
+    return ReadJson(out / "layout" / "rows.json");
+  }
+
+  long long clipId = 0;
+  fs::path out;
+};
+
+TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProject) {
+  const bool ownRows = GetParam();
+  std::string opening;
+  const json layout = Layout(opening);
+  ASSERT_FALSE(layout.is_null());
+  const json& panel = Panel(layout);
+  for (const json& row : panel.at("rows")) {
+    const std::string className = row.at("class").get<std::string>();
+    for (const char* own :
+         {"VideoFloatSliderParameter", "AngleSliderParameter", "PointSliderParameter",
+          "ButtonParameter", "TimecodeParameter", "TrackMenuParameter", "OpaqueParameter"}) {
+      EXPECT_NE(className.rfind(std::string(own) + " (host ", 0), 0u)
+          << "a host row stands in for " << row.at("path").dump();
+    }
+  }
+  const ListPlace list = PlaceOf(panel);
+
+  struct Edit {
+    std::vector<std::string> path;
+    int nth;
+    std::string className;
+    std::string lines;  // %C: the control point, %S: the stopwatch, %T: the turns field
+    std::string action;
+  };
+  std::vector<Edit> edits = {
+      {{"Motion", "Scale"},
+       0,
+       "VideoFloatSliderParameter",
+       "drag %C(15) %C(60) steps 5",
+       "MZ.ComponentParam.SetValue"},
+      {{"Opacity", "Opacity"},
+       0,
+       "VideoFloatSliderParameter",
+       "click %C(15)\ntype 42\nkey Return",
+       "MZ.ComponentParam.SetValue"},
+      {{"Timecode", "Starting Timecode"},
+       0,
+       "TimecodeParameter",
+       "drag %C(20) %C(50) steps 6",
+       "MZ.ComponentParam.SetValue"},
+      {{"Timecode", "Starting Timecode"},
+       0,
+       "TimecodeParameter",
+       "click %C(20)\ntype 00:00:02:10\nkey Return",
+       "MZ.ComponentParam.SetValue"},
+      {{"Grid Distortion", "Reset Grid"},
+       0,
+       "ButtonParameter",
+       "click %C(20)",
+       "MZ.ComponentParam.SetValue"},
+      {{"Matte From Track", "Matte"},
+       0,
+       "TrackMenuParameter",
+       "menu-answer 18603\nclick %C(20)",
+       "MZ.ComponentParam.SetValue"},
+      {{"Advanced", "Settings"},
+       0,
+       "OpaqueParameter",
+       "click %S",
+       "MZ.ComponentParam.SetTimeVarying"},
+  };
+  if (ownRows) {
+    edits.push_back({{"Motion", "Rotation"},
+                     0,
+                     "AngleSliderParameter",
+                     "drag %C(15) %C(45) steps 5",
+                     "MZ.ComponentParam.SetValue"});
+    edits.push_back({{"Motion", "Rotation"},
+                     0,
+                     "AngleSliderParameter",
+                     "click %T\ntype 3\nkey Return",
+                     "MZ.ComponentParam.SetValue"});
+    edits.push_back({{"Motion", "Position"},
+                     0,
+                     "PointSliderParameter",
+                     "drag %C(15) %C(55) steps 5",
+                     "MZ.ComponentParam.SetValue"});
+    edits.push_back({{"Motion", "Position"},
+                     1,
+                     "PointSliderParameter",
+                     "click %C(15)\ntype 300\nkey Return",
+                     "MZ.ComponentParam.SetValue"});
+  }
+
+  std::ostringstream script;
+  script << opening << "save before.project.json\n";
+  for (std::size_t i = 0; i < edits.size(); ++i) {
+    const Edit& edit = edits[i];
+    const auto row = FindRow(panel, edit.path, edit.nth);
+    ASSERT_TRUE(row.has_value()) << "no row " << edit.path.back();
+    EXPECT_EQ(row->className, edit.className) << edit.path.back();
+    ASSERT_TRUE(row->shown) << edit.path.back() << " is not shown";
+    std::string lines = edit.lines;
+    for (std::size_t at; (at = lines.find('%')) != std::string::npos;) {
+      const char kind = lines[at + 1];
+      std::string replacement;
+      std::size_t length = 2;
+      if (kind == 'S') {
+        replacement = StopwatchPoint(list, *row);
+      } else if (kind == 'T') {
+        // The turns field sits right of the 70-pixel value field.
+        replacement = ControlPoint(list, *row, 10 + 70 + 4 + 10);
+      } else {
+        const std::size_t close = lines.find(')', at);
+        replacement = ControlPoint(list, *row, std::stoi(lines.substr(at + 3, close - at - 3)));
+        length = close - at + 1;
+      }
+      lines.replace(at, length, replacement);
+    }
+    script << lines << "\ndump edit" << i << ".dump.json\n";
+  }
+  script << "save edited.project.json\n";
+  for (std::size_t i = 0; i < edits.size(); ++i) {
+    script << "undo\n";
+  }
+  script << "dump undone.dump.json\nsave undone.project.json\n";
+  ASSERT_TRUE(RunProgram(out / "edits", script.str(), ownRows));
+
+  for (std::size_t i = 0; i < edits.size(); ++i) {
+    const json dump = ReadJson(out / "edits" / ("edit" + std::to_string(i) + ".dump.json"));
+    EXPECT_TRUE(dump.at("assertions").empty()) << dump.at("assertions").dump();
+    const std::vector<std::string> done = UndoDone(dump);
+    ASSERT_EQ(done.size(), i + 1) << "editing " << edits[i].path.back() << " (" << edits[i].lines
+                                  << ") made " << done.size() - i << " steps";
+    EXPECT_EQ(done.back(), edits[i].action) << edits[i].path.back();
+  }
+  // What the edits wrote, read from the saved file.
+  const json edited = ReadJson(out / "edits" / "edited.project.json");
+  const auto value = [&](const char* matchName, const char* paramName) {
+    const json* param = FindParam(edited, clipId, matchName, paramName);
+    return param != nullptr ? param->at("value") : json();
+  };
+  EXPECT_EQ(value("XO.KRVN Opacity", "Opacity"), (json{{"double", 42.0}}));
+  EXPECT_EQ(value("XO.KRVN MatteFromTrack", "Matte"), (json{{"choice", 3}}));
+  EXPECT_EQ(value("XO.KRVN GridDistortion", "Reset Grid"), (json{{"bool", true}}));
+  // 00:00:02:10 at 25 fps is frame 60, stored in ticks.
+  EXPECT_EQ(value("XO.KRVN Timecode", "Starting Timecode"),
+            (json{{"double", 60.0 * 10160640000.0}}));
+  const json* settings = FindParam(edited, clipId, "XO.KRVN GridDistortion", "Settings");
+  ASSERT_NE(settings, nullptr);
+  EXPECT_TRUE(settings->at("timeVarying").get<bool>());
+  if (ownRows) {
+    const json rotation = value("XO.KRVN Motion", "Rotation");
+    ASSERT_TRUE(rotation.contains("double"));
+    // Three whole turns typed over the rest that the drag left.
+    EXPECT_GT(rotation.at("double").get<double>(), 3 * 360.0 - 180.0);
+    EXPECT_LE(rotation.at("double").get<double>(), 3 * 360.0 + 180.0);
+    const json position = value("XO.KRVN Motion", "Position");
+    ASSERT_TRUE(position.contains("point"));
+    EXPECT_EQ(position.at("point").at(1).get<double>(), 300.0);
+    EXPECT_NE(position.at("point").at(0).get<double>(), 960.0);
+  }
+  EXPECT_NE(ReadText(out / "edits" / "before.project.json"),
+            ReadText(out / "edits" / "edited.project.json"));
+
+  const json undone = ReadJson(out / "edits" / "undone.dump.json");
+  EXPECT_TRUE(UndoDone(undone).empty());
+  EXPECT_EQ(ReadText(out / "edits" / "before.project.json"),
+            ReadText(out / "edits" / "undone.project.json"))
+      << "undoing every edit did not restore the saved project";
+}
+
+INSTANTIATE_TEST_SUITE_P(BothRowStyles, ValueRowsProgram, ::testing::Bool(),
+                         [](const ::testing::TestParamInfo<bool>& param) {
+                           return param.param ? std::string("OwnSliderRows")
+                                              : std::string("HostRows");
+                         });
+
+}  // namespace
