@@ -24,8 +24,7 @@ void ButtonParameter::PositionSelf(int top, int depth, int width) {
                                      IsInGroup() ? kGroupButtonHeight : kButtonHeight));
 }
 
-void ButtonParameter::GetKeyframeTimes(std::set<TickTime>& /*times*/,
-                                       bool /*toSequenceTime*/) const {}
+void ButtonParameter::GetKeyframeTimes(std::set<TickTime>& /*times*/, TimeLine /*line*/) const {}
 
 void ButtonParameter::RefreshDisplayName() {
   ParameterControl::RefreshDisplayName();

@@ -30,7 +30,7 @@ class ButtonParameter : public ParameterControl {
   int OwnHeight() const override;
   void PositionSelf(int top, int depth, int width) override;
   // Buttons have no keyframe times.
-  void GetKeyframeTimes(std::set<TickTime>& times, bool toSequenceTime) const override;
+  void GetKeyframeTimes(std::set<TickTime>& times, TimeLine line) const override;
   bool CanTimeVary() const override { return false; }
   void SetTimeVarying(bool /*timeVarying*/) override {}
   // Name and label from the model; nothing else of a button changes with time.

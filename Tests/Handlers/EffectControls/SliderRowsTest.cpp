@@ -236,7 +236,7 @@ TEST_F(SliderRowTest, AnAngleRowWritesAKeyframeWhenTheAngleVaries) {
   EXPECT_EQ(rotation->GetKeyframeTimes(), (std::vector<TickTime>{0, 2 * kSec}));
   EXPECT_EQ(UndoNames().size(), 1u);
   std::set<TickTime> times;
-  row->GetKeyframeTimes(times, true);
+  row->GetKeyframeTimes(times, TimeLine::kSequence);
   EXPECT_EQ(times, (std::set<TickTime>{0, 2 * kSec}));
 }
 

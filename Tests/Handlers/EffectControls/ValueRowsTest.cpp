@@ -135,7 +135,7 @@ TEST_F(ValueRowTest, AClickSetsTheButtonTrueAsOneStepAndShowsNoKeyframes) {
   row->GetButton()->Click();
   EXPECT_EQ(UndoNames().size(), 1u);
   std::set<TickTime> times;
-  row->GetKeyframeTimes(times, true);
+  row->GetKeyframeTimes(times, TimeLine::kSequence);
   EXPECT_TRUE(times.empty());
   // No stopwatch: the button is the row's only view.
   EXPECT_FALSE(row->CanTimeVary());
