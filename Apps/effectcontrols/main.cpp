@@ -12,11 +12,8 @@
 #include <vector>
 
 #include "Apps/effectcontrols/EmbeddedDemoProject.h"
-#include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessageLoop.h"
 #include "Host/Messaging/Preferences.h"
-#include "Host/Messaging/Station.h"
-#include "Host/Model/ModelMessages.h"
 #include "Host/Model/Project.h"
 #include "Host/Model/ProjectFile.h"
 #include "Host/Shell/Application.h"
@@ -82,8 +79,9 @@ void AllowSaving(ScriptRunner& runner) {
   });
 }
 
-std::string WindowTitle(const ProjectDocument& document) {
-  return "Effect Controls - " + document.GetTitle();
+std::string WindowTitle(const Application& application) {
+  const ProjectDocument* document = application.GetDocument();
+  return document != nullptr ? "Effect Controls - " + document->GetTitle() : "Effect Controls";
 }
 
 // `scriptPath` names the script in a failure (empty for the program's own one-shot frame).
@@ -121,33 +119,35 @@ int Run(const ProgramOptions& options) {
   application.LoadModules();
   application.CreateHandlers();
   application.OpenProject(std::move(project), options.projectPath);
-  ProjectDocument& document = *application.GetDocument();
-  document.SetFailureReporter([](const std::string& reason) {
-    std::cerr << "effectcontrols: the project was not saved: " << reason << "\n";
-  });
+  application.SetFailureReporter(
+      [](const std::string& message) { std::cerr << "effectcontrols: " << message << "\n"; });
   application.OpenAllWindows();
   Settle(application);
 
   const bool windowed = !options.headless && HasDisplay();
   if (windowed) {
-    const auto window = SdlWindow::Open(application.GetViewHost(), WindowTitle(document), &error);
+    const auto window =
+        SdlWindow::Open(application.GetViewHost(), WindowTitle(application), &error);
     if (window == nullptr)
       return Fail(kExitCannotStart, "cannot open a window (" + error + "); use --headless");
     if (!script) {
-      // The title marks unsaved changes; a failed save is shown; closing asks to save them.
-      FunctionListener history([&](const Message& message) {
-        if (message.Is<UndoHistoryChangedMessage>())
-          window->SetTitle(WindowTitle(document));
+      // The title follows the project and its unsaved changes, a failed save or open is shown,
+      // closing (and Ctrl+Q) asks to save the changes. Opening replaces the document: each use
+      // asks the application for the current one.
+      window->SetTitleSource([&application] { return WindowTitle(application); });
+      application.SetFailureReporter([&window](const std::string& message) {
+        window->ShowMessage("Effect Controls", message);
       });
-      AddListener(application.GetProject()->GetStation(), history);
-      document.SetFailureReporter([&window](const std::string& reason) {
-        window->ShowMessage("The project was not saved", reason);
+      window->SetCloseGuard([&application] {
+        ProjectDocument* document = application.GetDocument();
+        return document == nullptr || document->ConfirmClose();
       });
-      window->SetCloseGuard([&document] { return document.ConfirmClose(); });
+      application.SetQuitHandler([&window] { window->RequestClose(); });
       // Popup menus and input boxes appear over the window.
       const auto previousMenus = SetMenuTracker(std::make_shared<SdlMenuTracker>(*window));
       const auto previousBoxes = InputBox::SetResponder(std::make_shared<SdlInputBox>(*window));
       window->Run();
+      application.SetQuitHandler(nullptr);
       SetMenuTracker(previousMenus);
       InputBox::SetResponder(previousBoxes);
       return EXIT_SUCCESS;

@@ -7,6 +7,7 @@
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ModelMessages.h"
 #include "Host/Model/Project.h"
+#include "Host/Model/ProjectFile.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/UndoStack.h"
@@ -15,6 +16,7 @@
 #include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ShellMessages.h"
 #include "Host/Shell/WorkspaceFrame.h"
+#include "Host/Toolkit/InputBox.h"
 #include "Host/Toolkit/StandardCommands.h"
 #include "Host/Toolkit/TabView.h"
 #include "Host/Toolkit/ViewHost.h"
@@ -68,16 +70,47 @@ class EditCommands : public CommandHandler {
   Application& mApplication;  // owns this handler
 };
 
+// Opening another project and quitting, for the keys and menus of every panel.
+class FileCommands : public CommandHandler {
+ public:
+  explicit FileCommands(Application& application) : mApplication(application) {}
+
+  bool FindCommandStatus(CommandID command, CommandStatus& status) override {
+    if (command != kCommandOpen && command != kCommandQuit)
+      return false;
+    status = CommandStatus{};
+    status.enabled = command == kCommandOpen || mApplication.CanQuit();
+    return true;
+  }
+
+  bool ObeyCommand(CommandID command) override {
+    if (command == kCommandOpen) {
+      mApplication.OpenProjectFromFile();
+      return true;
+    }
+    if (command == kCommandQuit) {
+      mApplication.Quit();
+      return true;
+    }
+    return false;
+  }
+
+ private:
+  Application& mApplication;  // owns this handler
+};
+
 }  // namespace
 
 Application::Application(Size workspaceSize)
     : mViewHost(std::make_unique<ViewHost>(workspaceSize)),
       mFrame(std::make_shared<WorkspaceFrame>()),
-      mEditCommands(std::make_unique<EditCommands>(*this)) {
+      mEditCommands(std::make_unique<EditCommands>(*this)),
+      mFileCommands(std::make_unique<FileCommands>(*this)) {
   mViewHost->SetRootView(mFrame);
   if (HOST_VERIFY(gInstance == nullptr, "There is one Application per process")) {
     gInstance = this;
     CommandHandler::RegisterFallbackHandler(*mEditCommands);
+    CommandHandler::RegisterFallbackHandler(*mFileCommands);
   }
 }
 
@@ -311,11 +344,44 @@ void Application::OpenProject(ProjectRef project, std::string path) {
   if (mProject == nullptr)
     return;
   mDocument = std::make_unique<ProjectDocument>(mProject, std::move(path));
+  mDocument->SetFailureReporter(mReportFailure);
   SequenceRef sequence = mProject->GetActiveSequence();
   if (sequence == nullptr && !mProject->GetSequences().empty())
     sequence = mProject->GetSequences().front();
   if (sequence != nullptr)
     ActivateSequence(sequence);
+}
+
+bool Application::OpenProjectFromFile() {
+  const std::string offered = mDocument != nullptr ? mDocument->GetPath() : std::string();
+  const std::optional<std::string> path =
+      InputBox::Ask("$$$/Vantile/Shell/OpenTitle=Open Project",
+                    "$$$/Vantile/Shell/OpenPrompt=File name:", offered);
+  if (!path || path->empty())
+    return false;
+  if (mDocument != nullptr && !mDocument->ConfirmClose())
+    return false;
+  ProjectLoadResult loaded = ProjectFile::Load(*path);
+  if (!loaded) {
+    if (mReportFailure)
+      mReportFailure("Cannot open the project: " + (loaded.error.starts_with(*path)
+                                                        ? loaded.error
+                                                        : *path + ": " + loaded.error));
+    return false;
+  }
+  OpenProject(std::move(loaded.project), *path);
+  return true;
+}
+
+void Application::SetFailureReporter(std::function<void(const std::string&)> reporter) {
+  mReportFailure = std::move(reporter);
+  if (mDocument != nullptr)
+    mDocument->SetFailureReporter(mReportFailure);
+}
+
+void Application::Quit() {
+  if (mQuit)
+    mQuit();
 }
 
 void Application::CloseProject() {

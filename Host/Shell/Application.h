@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
@@ -118,6 +119,17 @@ class Application {
   const ProjectRef& GetProject() const { return mProject; }
   // The open project's file: saving and whether it changed. Null without a project.
   ProjectDocument* GetDocument() const { return mDocument.get(); }
+  // Asks for a project file through the input box and opens it in place of the open one (which
+  // may first ask to save its changes). False when cancelled or the file does not load (the
+  // failure reporter is told why); the open project then stays.
+  bool OpenProjectFromFile();
+  // Told what a person must read when opening or saving failed (every document gets it).
+  void SetFailureReporter(std::function<void(const std::string&)> reporter);
+  // What "cmd.file.quit" (Ctrl+Q) does: the window front end closes its window, which asks to
+  // save changes first. Without one the command is disabled.
+  void SetQuitHandler(std::function<void()> quit) { mQuit = std::move(quit); }
+  bool CanQuit() const { return static_cast<bool>(mQuit); }
+  void Quit();
   // Makes `sequence` (of the open project) the active one: SequenceOpenedMessage the first time,
   // then the project's SequenceActivatedMessage, and on the sequence-activation station
   // SequenceActivatedMessage and SequenceFocusedMessage. False for a sequence of no open project.
@@ -174,4 +186,7 @@ class Application {
   bool mMenusDisabled = false;
   std::unique_ptr<CommandHandler> mEditCommands;  // undo and redo
   std::unique_ptr<ProjectDocument> mDocument;     // save and save as
+  std::unique_ptr<CommandHandler> mFileCommands;  // open and quit
+  std::function<void(const std::string&)> mReportFailure;
+  std::function<void()> mQuit;
 };

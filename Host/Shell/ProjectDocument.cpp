@@ -75,7 +75,7 @@ ProjectDocument::SaveOutcome ProjectDocument::SaveTo(const std::string& path) {
   if (!ProjectFile::Save(*mProject, path, &error)) {
     mLastError = error.empty() ? "cannot write " + path : error;
     if (mReportFailure) {
-      mReportFailure(mLastError);
+      mReportFailure("Cannot save the project: " + mLastError);
     }
     return SaveOutcome::kFailed;
   }

@@ -5,7 +5,10 @@
 #include "Host/Messaging/Localization.h"
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Font.h"
+#include "Host/Toolkit/Menu.h"
+#include "Host/Toolkit/MenuTracker.h"
 #include "Host/Toolkit/TabView.h"
+#include "Host/Toolkit/ViewHost.h"
 
 namespace {
 
@@ -19,6 +22,20 @@ constexpr int kLabelPadding = 12;
 constexpr int kMaxLabelWidth = 220;
 constexpr int kFlyoutButtonWidth = 22;
 constexpr Color kFlyoutGlyphColor(190, 190, 190);
+constexpr int kFileMenuButtonWidth = 44;
+
+constexpr std::string_view kFileMenuText = R"(
+menu Workspace_File_Menu
+  item 57601 "$$$/Vantile/Shell/Menu/Open=Open Project..."
+  item 57603 "$$$/Vantile/Shell/Menu/Save=Save"
+  item 57604 "$$$/Vantile/Shell/Menu/SaveAs=Save As..."
+  separator
+  item 57643 "$$$/Vantile/Shell/Menu/Undo=Undo"
+  item 57644 "$$$/Vantile/Shell/Menu/Redo=Redo"
+  separator
+  item 57665 "$$$/Vantile/Shell/Menu/Quit=Quit"
+end
+)";
 
 }  // namespace
 
@@ -119,6 +136,20 @@ Rect WorkspaceFrame::GetFlyoutButtonRect() const {
   return {std::max(0, width - kFlyoutButtonWidth), 0, width, kTabStripHeight};
 }
 
+Rect WorkspaceFrame::GetFileMenuButtonRect() const {
+  const Rect flyout = GetFlyoutButtonRect();
+  const int right = flyout.IsEmpty() ? GetBounds().Width() : flyout.left;
+  return {std::max(0, right - kFileMenuButtonWidth), 0, std::max(0, right), kTabStripHeight};
+}
+
+const Menu& WorkspaceFrame::GetFileMenu() {
+  static const Menu menu = [] {
+    const std::optional<std::vector<Menu>> menus = Menu::Parse(kFileMenuText);
+    return menus && !menus->empty() ? menus->front() : Menu("Workspace_File_Menu");
+  }();
+  return menu;
+}
+
 void WorkspaceFrame::TabsChanged() {
   Prune();
   if (GetFrontTab() == nullptr) {
@@ -152,6 +183,8 @@ void WorkspaceFrame::PaintSelf(DC& dc) {
     dc.DrawText(LocalizeString(tabs[i]->GetTabName()), label.Inset(kLabelPadding, 0), font,
                 isFront ? kFrontTextColor : kBackTextColor, TextAlign::kLeft, TextVAlign::kCenter);
   }
+  dc.DrawText(LocalizeString("$$$/Vantile/Shell/Menu/File=File"), GetFileMenuButtonRect(), font,
+              kFrontTextColor, TextAlign::kCenter, TextVAlign::kCenter);
   // Three short bars: the flyout menu button.
   const Rect button = GetFlyoutButtonRect();
   if (!button.IsEmpty()) {
@@ -163,6 +196,17 @@ void WorkspaceFrame::PaintSelf(DC& dc) {
 }
 
 void WorkspaceFrame::LeftButtonDownSelf(Point point, KeyModifiers /*modifiers*/) {
+  if (const Rect button = GetFileMenuButtonRect(); button.Contains(point)) {
+    // From the front tab, so its chain answers first, as the keys do; the tab may go meanwhile.
+    TabView* front = GetFrontTab();
+    const std::shared_ptr<ViewBase> keep =
+        front != nullptr ? front->shared_from_this() : shared_from_this();
+    Commander& commander = front != nullptr ? static_cast<Commander&>(*front) : *this;
+    const ViewHost* host = GetHost();
+    RunPopupMenu(GetFileMenu(), commander, LocalToWindow(Point{button.left, button.bottom}),
+                 host != nullptr ? &host->GetShortcutManager() : nullptr);
+    return;
+  }
   if (const Rect button = GetFlyoutButtonRect(); button.Contains(point)) {
     TabView* front = GetFrontTab();
     // The menu opens under the button, in the tab's coordinates; the tab may go while it runs.

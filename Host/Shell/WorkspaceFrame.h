@@ -7,13 +7,15 @@
 #include "Host/Toolkit/SubView.h"
 #include "Host/Toolkit/TabFrame.h"
 
+class Menu;
 class TabView;
 
 // The application's workspace: the window's root view, holding the panel tabs stacked in one
 // group. A strip along the top shows each tab's name; the front tab fills the rest and the
 // others are hidden. Clicking a name brings that tab to the front and focuses it. When the
 // front tab names a flyout menu, a button at the strip's right end opens it and sends the
-// chosen command from the front tab up its chain.
+// chosen command from the front tab up its chain. Left of it, "File" opens the program's menu
+// (open, save, save as, undo, redo, quit), whose commands take the same way.
 //
 // The frame shares ownership of its tabs through the view tree; a tab that is destroyed leaves
 // it (call TabsChanged afterwards so that another tab comes to the front). UI thread only.
@@ -40,6 +42,10 @@ class WorkspaceFrame : public SubView, public TabFrame {
   Rect GetTabArea() const;
   // The flyout menu button in frame coordinates; empty when the front tab has no flyout menu.
   Rect GetFlyoutButtonRect() const;
+  // The "File" menu button in frame coordinates.
+  Rect GetFileMenuButtonRect() const;
+  // The program's menu as the "File" button shows it.
+  static const Menu& GetFileMenu();
 
   // Forgets tabs that left the frame and shows another one when the front tab went.
   void TabsChanged();

@@ -15,8 +15,8 @@ struct StandardCommand {
   std::array<KeyStroke, 2> keys;  // unused slots have no key
 };
 
-const std::array<StandardCommand, 12>& StandardCommands() {
-  static const std::array<StandardCommand, 12> commands{{
+const std::array<StandardCommand, 14>& StandardCommands() {
+  static const std::array<StandardCommand, 14> commands{{
       {"cmd.edit.clear",
        kCommandClear,
        {KeyStroke(KeyCode::kDelete), KeyStroke(KeyCode::kBackspace)}},
@@ -33,12 +33,14 @@ const std::array<StandardCommand, 12>& StandardCommands() {
       {"cmd.edit.redo",
        kCommandRedo,
        {KeyStroke(KeyCode::kZ, kKeyModifierCtrl | kKeyModifierShift), KeyStroke()}},
+      {"cmd.file.open", kCommandOpen, {KeyStroke(KeyCode::kO, kKeyModifierCtrl), KeyStroke()}},
       {"cmd.file.save", kCommandSave, {KeyStroke(KeyCode::kS, kKeyModifierCtrl), KeyStroke()}},
       {"cmd.file.saveas",
        kCommandSaveAs,
        {KeyStroke(KeyCode::kS, kKeyModifierCtrl | kKeyModifierShift), KeyStroke()}},
       {"cmd.file.dontsave", kCommandDontSave, {KeyStroke(), KeyStroke()}},
       {"cmd.file.cancelclose", kCommandCancelClose, {KeyStroke(), KeyStroke()}},
+      {"cmd.file.quit", kCommandQuit, {KeyStroke(KeyCode::kQ, kKeyModifierCtrl), KeyStroke()}},
   }};
   return commands;
 }

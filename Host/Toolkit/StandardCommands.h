@@ -12,9 +12,11 @@ inline constexpr CommandID kCommandSelectAll = 57642;    // "cmd.edit.selectall"
 inline constexpr CommandID kCommandUndo = 57643;         // "cmd.edit.undo": Ctrl+Z
 inline constexpr CommandID kCommandRedo = 57644;         // "cmd.edit.redo": Ctrl+Shift+Z
 inline constexpr CommandID kCommandDeselectAll = 11303;  // "cmd.edit.deselectall": Ctrl+Shift+A
-// The open project's file.
+// The open project's file, and the program.
+inline constexpr CommandID kCommandOpen = 57601;    // "cmd.file.open": Ctrl+O
 inline constexpr CommandID kCommandSave = 57603;    // "cmd.file.save": Ctrl+S
 inline constexpr CommandID kCommandSaveAs = 57604;  // "cmd.file.saveas": Ctrl+Shift+S
 // The answers to "save the changes before closing?" besides kCommandSave.
 inline constexpr CommandID kCommandDontSave = 57605;     // "cmd.file.dontsave"
 inline constexpr CommandID kCommandCancelClose = 57606;  // "cmd.file.cancelclose"
+inline constexpr CommandID kCommandQuit = 57665;         // "cmd.file.quit": Ctrl+Q

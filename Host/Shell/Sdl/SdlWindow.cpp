@@ -504,6 +504,7 @@ struct SdlWindow::Impl {
       }
     }
     loop.RunPending();
+    UpdateTitle();
     if (!host.GetDirtyRegion().IsEmpty())
       host.Render();
     else if (modal != nullptr && modalDirty)
@@ -529,6 +530,18 @@ struct SdlWindow::Impl {
   bool closed = false;
   std::function<bool()> closeGuard;
   bool closeJustRefused = false;
+  std::function<std::string()> titleSource;
+  std::string shownTitle;
+
+  void UpdateTitle() {
+    if (!titleSource)
+      return;
+    std::string wanted = titleSource();
+    if (wanted != shownTitle) {
+      shownTitle = std::move(wanted);
+      SDL_SetWindowTitle(window, shownTitle.c_str());
+    }
+  }
 
   void AskToClose() {
     if (!closed)
@@ -574,7 +587,13 @@ void SdlWindow::SetCloseGuard(std::function<bool()> guard) {
 }
 
 void SdlWindow::SetTitle(const std::string& title) {
+  mImpl->shownTitle = title;
   SDL_SetWindowTitle(mImpl->window, title.c_str());
+}
+
+void SdlWindow::SetTitleSource(std::function<std::string()> source) {
+  mImpl->titleSource = std::move(source);
+  mImpl->UpdateTitle();
 }
 
 void SdlWindow::ShowMessage(const std::string& title, const std::string& text) {

@@ -41,6 +41,8 @@ class SdlWindow {
   // keeps it open. Without one the window always closes.
   void SetCloseGuard(std::function<bool()> guard);
   void SetTitle(const std::string& title);
+  // Asked after every pump; the window takes a title that changed.
+  void SetTitleSource(std::function<std::string()> source);
   // A message box over the window, for what a person must read (a failed save).
   void ShowMessage(const std::string& title, const std::string& text);
 

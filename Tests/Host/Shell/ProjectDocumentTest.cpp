@@ -118,7 +118,7 @@ TEST_F(ProjectDocumentTest, AFailedSaveKeepsTheChangesTheOldFileAndSaysWhy) {
   EXPECT_EQ(document.GetPath(), file);  // still the file it came from
   ASSERT_EQ(reported.size(), 1u);
   EXPECT_FALSE(document.GetLastError().empty());
-  EXPECT_EQ(reported.front(), document.GetLastError());
+  EXPECT_EQ(reported.front(), "Cannot save the project: " + document.GetLastError());
   EXPECT_EQ(NameInFile(file), "First");
   // The next save that works clears the reason.
   EXPECT_EQ(document.Save(), ProjectDocument::SaveOutcome::kSaved);

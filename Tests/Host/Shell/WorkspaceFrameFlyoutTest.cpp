@@ -108,9 +108,16 @@ TEST_F(WorkspaceFrameFlyoutTest, ADismissedFlyoutSendsNothing) {
   EXPECT_EQ(tab->toggles, 0);
 }
 
-TEST_F(WorkspaceFrameFlyoutTest, ATabWithoutAFlyoutHasNoButton) {
+TEST_F(WorkspaceFrameFlyoutTest, ATabWithoutAFlyoutHasNoButtonAndTheFileMenuTakesTheEnd) {
   Open("");
   EXPECT_TRUE(frame->GetFlyoutButtonRect().IsEmpty());
+  EXPECT_EQ(frame->GetFileMenuButtonRect().right, 600);
   ClickAt(Point{595, 10});
-  EXPECT_TRUE(mTracker->GetRequests().empty());
+  ASSERT_EQ(mTracker->GetRequests().size(), 1U);
+  EXPECT_EQ(mTracker->GetRequests().front().menuName, "Workspace_File_Menu");
+}
+
+TEST_F(WorkspaceFrameFlyoutTest, TheFileMenuSitsLeftOfTheFlyoutButton) {
+  Open(kFlyoutName);
+  EXPECT_EQ(frame->GetFileMenuButtonRect().right, frame->GetFlyoutButtonRect().left);
 }

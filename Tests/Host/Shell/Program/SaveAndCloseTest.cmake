@@ -1,8 +1,8 @@
 cmake_minimum_required(VERSION 3.25)
 
 # Saving with Ctrl+S writes the project's own file, and closing asks while there are changes:
-# "Cancel" keeps the program going, "Don't Save" leaves the file as it was. A file that does not
-# exist yet is a new project that saves there.
+# "Cancel" keeps the program going, "Don't Save" leaves the file as it was. Ctrl+O opens a saved
+# file in place of the demo. A file that does not exist yet is a new project that saves there.
 #   -DPROGRAM=path  -DPROJECT=file (copied, never written)  -DSCRIPTS=dir  -DOUT=dir
 file(REMOVE_RECURSE "${OUT}")
 file(MAKE_DIRECTORY "${OUT}")
@@ -64,6 +64,16 @@ endif()
 # The saved file opens again and saves to the same bytes.
 resave("${OUT}/work.json" resaved.json)
 expect_same("${OUT}/work.json" "${OUT}/resaved.json")
+
+# Open (Ctrl+O) from the built-in demo: the document is the opened file from then on.
+file(WRITE "${OUT}/open.ecs" "input-answer ${OUT}/work.json\ncommand cmd.file.open\ndump opened.dump.json\n")
+execute_process(COMMAND "${PROGRAM}" --headless --script "${OUT}/open.ecs" --out "${OUT}"
+                RESULT_VARIABLE exit_code ERROR_VARIABLE err)
+if(NOT exit_code EQUAL 0 OR err MATCHES "warning:")
+  message(FATAL_ERROR "open.ecs exited with ${exit_code}:\n${err}")
+endif()
+expect_document(opened.dump.json path "${OUT}/work.json")
+expect_document(opened.dump.json modified OFF)
 
 # Don't Save: the file stays as it was.
 configure_file("${OUT}/work.json" "${OUT}/before-discard.json" COPYONLY)
