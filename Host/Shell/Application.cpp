@@ -9,6 +9,7 @@
 #include "Host/Model/Project.h"
 #include "Host/Model/ProjectFile.h"
 #include "Host/Model/Sequence.h"
+#include "Host/Model/SequencePlayer.h"
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Handler.h"
@@ -99,18 +100,66 @@ class FileCommands : public CommandHandler {
   Application& mApplication;  // owns this handler
 };
 
+// Playing and stepping the active sequence, for the keys of every panel.
+class TransportCommands : public CommandHandler {
+ public:
+  explicit TransportCommands(Application& application) : mApplication(application) {}
+
+  bool FindCommandStatus(CommandID command, CommandStatus& status) override {
+    if (!IsTransport(command))
+      return false;
+    status = CommandStatus{};
+    status.enabled = mApplication.GetActiveSequence() != nullptr;
+    status.checked = command == kCommandPlayStop && mApplication.IsPlaying();
+    return true;
+  }
+
+  bool ObeyCommand(CommandID command) override {
+    switch (command) {
+      case kCommandPlayStop:
+        mApplication.TogglePlayback();
+        return true;
+      case kCommandGoToStart:
+        mApplication.GoToSequenceStart();
+        return true;
+      case kCommandGoToEnd:
+        mApplication.GoToSequenceEnd();
+        return true;
+      case kCommandStepBack:
+        mApplication.StepFrames(-1);
+        return true;
+      case kCommandStepForward:
+        mApplication.StepFrames(1);
+        return true;
+      default:
+        return false;
+    }
+  }
+
+ private:
+  static bool IsTransport(CommandID command) {
+    return command == kCommandPlayStop || command == kCommandGoToStart ||
+           command == kCommandGoToEnd || command == kCommandStepBack ||
+           command == kCommandStepForward;
+  }
+
+  Application& mApplication;  // owns this handler
+};
+
 }  // namespace
 
 Application::Application(Size workspaceSize)
     : mViewHost(std::make_unique<ViewHost>(workspaceSize)),
       mFrame(std::make_shared<WorkspaceFrame>()),
       mEditCommands(std::make_unique<EditCommands>(*this)),
-      mFileCommands(std::make_unique<FileCommands>(*this)) {
+      mFileCommands(std::make_unique<FileCommands>(*this)),
+      mTransportCommands(std::make_unique<TransportCommands>(*this)) {
   mViewHost->SetRootView(mFrame);
   if (HOST_VERIFY(gInstance == nullptr, "There is one Application per process")) {
     gInstance = this;
     CommandHandler::RegisterFallbackHandler(*mEditCommands);
     CommandHandler::RegisterFallbackHandler(*mFileCommands);
+    CommandHandler::RegisterFallbackHandler(*mTransportCommands);
   }
 }
 
@@ -384,6 +433,65 @@ void Application::Quit() {
     mQuit();
 }
 
+bool Application::TogglePlayback() {
+  const SequenceRef sequence = GetActiveSequence();
+  if (sequence == nullptr)
+    return false;
+  if (mPlayer == nullptr || mPlayer->GetSequence() != sequence)
+    mPlayer = SequencePlayer::Create(sequence, mPlayerClock);
+  if (mPlayer->IsPlaying()) {
+    mPlayer->Stop();
+    return true;
+  }
+  // At the end, playing starts again from the start, as editors do.
+  const TickTime end = sequence->GetEnd();
+  if (sequence->GetCurrentTime() >= end)
+    sequence->SetCurrentTime(0);
+  return mPlayer->Play(0, end);
+}
+
+bool Application::IsPlaying() const {
+  return mPlayer != nullptr && mPlayer->IsPlaying() &&
+         mPlayer->GetSequence() == GetActiveSequence();
+}
+
+bool Application::StepFrames(int frames) {
+  const SequenceRef sequence = GetActiveSequence();
+  if (sequence == nullptr)
+    return false;
+  if (mPlayer != nullptr)
+    mPlayer->Stop();
+  const TickTime frame = sequence->GetVideoFrameRate().GetTicksPerFrame();
+  const TickTime wanted = AddTimes(sequence->GetCurrentTime(), frame * frames);
+  sequence->SetCurrentTime(std::clamp<TickTime>(wanted, 0, sequence->GetEnd()));
+  return true;
+}
+
+bool Application::GoToSequenceStart() {
+  const SequenceRef sequence = GetActiveSequence();
+  if (sequence == nullptr)
+    return false;
+  if (mPlayer != nullptr)
+    mPlayer->Stop();
+  sequence->SetCurrentTime(0);
+  return true;
+}
+
+bool Application::GoToSequenceEnd() {
+  const SequenceRef sequence = GetActiveSequence();
+  if (sequence == nullptr)
+    return false;
+  if (mPlayer != nullptr)
+    mPlayer->Stop();
+  sequence->SetCurrentTime(sequence->GetEnd());
+  return true;
+}
+
+void Application::SetPlayerClock(std::shared_ptr<PlayerClock> clock) {
+  mPlayerClock = std::move(clock);
+  mPlayer.reset();
+}
+
 void Application::CloseProject() {
   if (mProject == nullptr)
     return;
@@ -392,6 +500,7 @@ void Application::CloseProject() {
   mOpenedSequences.clear();
   for (const SequenceRef& sequence : opened)
     BroadcastMessage(kSequenceActivationStation, SequenceClosedMessage(sequence));
+  mPlayer.reset();
   mDocument.reset();
   mProject.reset();
 }

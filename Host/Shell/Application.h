@@ -20,6 +20,8 @@
 class CommandHandler;
 class Handler;
 class Module;
+class PlayerClock;
+class SequencePlayer;
 class ProjectDocument;
 class TabView;
 class UndoStack;
@@ -130,6 +132,19 @@ class Application {
   void SetQuitHandler(std::function<void()> quit) { mQuit = std::move(quit); }
   bool CanQuit() const { return static_cast<bool>(mQuit); }
   void Quit();
+
+  // --- Playback of the active sequence ---
+  // Plays from the edit line to the sequence's end in real time (the edit line follows), or
+  // stops. False without an active sequence or with nothing left to play.
+  bool TogglePlayback();
+  bool IsPlaying() const;
+  // Stops playback and moves the edit line by whole video frames (limited to the sequence).
+  bool StepFrames(int frames);
+  // Stops playback and moves the edit line to the sequence's start or end.
+  bool GoToSequenceStart();
+  bool GoToSequenceEnd();
+  // The clock playback runs by (tests use a manual one); null: the steady clock.
+  void SetPlayerClock(std::shared_ptr<PlayerClock> clock);
   // Makes `sequence` (of the open project) the active one: SequenceOpenedMessage the first time,
   // then the project's SequenceActivatedMessage, and on the sequence-activation station
   // SequenceActivatedMessage and SequenceFocusedMessage. False for a sequence of no open project.
@@ -189,4 +204,7 @@ class Application {
   std::unique_ptr<CommandHandler> mFileCommands;  // open and quit
   std::function<void(const std::string&)> mReportFailure;
   std::function<void()> mQuit;
+  std::unique_ptr<CommandHandler> mTransportCommands;
+  std::shared_ptr<PlayerClock> mPlayerClock;
+  std::shared_ptr<SequencePlayer> mPlayer;  // of the active sequence, made on first use
 };

@@ -35,6 +35,7 @@ const std::map<std::string, VerbInfo, std::less<>>& VerbTable() {
       {"dump", {ScriptVerb::kDump, true}},
       {"save", {ScriptVerb::kSave, true}},
       {"close", {ScriptVerb::kClose, false}},
+      {"wait", {ScriptVerb::kWait, false}},
   };
   return table;
 }
@@ -122,6 +123,8 @@ class LineParser {
         return ParseExactIntegers(2, "X and Y");
       case ScriptVerb::kWheel:
         return ParseExactIntegers(1, "DY");
+      case ScriptVerb::kWait:
+        return ParseWait();
       case ScriptVerb::kResize:
         return ParseSize();
       case ScriptVerb::kKey:
@@ -170,6 +173,15 @@ class LineParser {
       return "'" + std::string(word) + "' is neither a tick count nor a timecode hh:mm:ss:ff";
     }
     mCommand.text = std::string(word);
+    return {};
+  }
+
+  // Milliseconds, 0 to a minute: a longer wait is surely a mistake in a script.
+  std::string ParseWait() {
+    if (std::string error = ParseExactIntegers(1, "MS"); !error.empty())
+      return error;
+    if (mCommand.numbers.front() < 0 || mCommand.numbers.front() > 60000)
+      return std::string(mVerbName) + " needs MS from 0 to 60000";
     return {};
   }
 

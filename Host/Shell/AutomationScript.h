@@ -32,6 +32,7 @@ enum class ScriptVerb {
   kDump,
   kSave,
   kClose,
+  kWait,
 };
 
 // Key modifier bits of the host's modifier word.

@@ -115,7 +115,8 @@ std::string ProgramOptions::Usage() {
          "  move X Y | wheel DY | key NAME [mods] | type TEXT\n"
          "  command ID-or-NAME | menu-answer ID-or-NAME|none | input-answer TEXT\n"
          "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE (a copy)\n"
-         "  close (as the window's close button: asks to save changes; ends the script)\n";
+         "  close (as the window's close button: asks to save changes; ends the script)\n"
+         "  wait MS (real time passes: playback runs)\n";
 }
 
 void ProgramOptions::ApplyPreferences(PropertyList& properties) const {

@@ -2,10 +2,12 @@
 
 #include <algorithm>
 #include <charconv>
+#include <chrono>
 #include <exception>
 #include <filesystem>
 #include <fstream>
 #include <limits>
+#include <thread>
 #include <utility>
 
 #include "Host/Messaging/MessageLoop.h"
@@ -170,6 +172,9 @@ std::string ScriptRunner::Execute(const ScriptCommand& command, ScriptRunResult&
       return RunSave(command, result);
     case ScriptVerb::kClose:
       return RunClose(command, result);
+    case ScriptVerb::kWait:
+      RunWait(command.numbers.front());
+      return {};
   }
   return "unknown verb";
 }
@@ -398,6 +403,15 @@ std::string ScriptRunner::RunSave(const ScriptCommand& command, ScriptRunResult&
     return "cannot save '" + path + "': " + (error.empty() ? "unknown error" : error);
   result.written.push_back(path);
   return {};
+}
+
+void ScriptRunner::RunWait(int milliseconds) {
+  // Real time passes while posted work and playback run, as they would in the window.
+  const auto until = std::chrono::steady_clock::now() + std::chrono::milliseconds(milliseconds);
+  while (std::chrono::steady_clock::now() < until) {
+    Settle();
+    std::this_thread::sleep_for(std::chrono::milliseconds(5));
+  }
 }
 
 std::string ScriptRunner::RunClose(const ScriptCommand& command, ScriptRunResult& result) {

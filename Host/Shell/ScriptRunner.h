@@ -78,6 +78,8 @@ class ScriptRunner {
   std::string RunMenuAnswer(const ScriptCommand& command);
   std::string RunUndoRedo(bool undo);
   std::string RunShot(const ScriptCommand& command, ScriptRunResult& result);
+  // Lets `milliseconds` of real time pass, delivering posted work (playback steps) meanwhile.
+  void RunWait(int milliseconds);
   // Asks to close the project as the window's close button does (a popup when it changed).
   std::string RunClose(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunDump(const ScriptCommand& command, ScriptRunResult& result);

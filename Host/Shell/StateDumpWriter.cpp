@@ -71,6 +71,7 @@ ordered_json SequenceJSON(const Sequence& sequence) {
   j["id"] = sequence.GetID();
   j["name"] = sequence.GetName();
   j["currentTime"] = sequence.GetCurrentTime();
+  j["end"] = sequence.GetEnd();
   ordered_json groups = ordered_json::array();
   for (const auto& group : sequence.GetSelection()) {
     ordered_json ids = ordered_json::array();

@@ -6,7 +6,7 @@ class Application;
 
 // Writes the automation dump: the application's state as JSON text. Keys:
 //   "workspace": size, maximised, front tab's handler id, the tabs' handler ids and names;
-//   "sequence": the active sequence's id, name, edit line (ticks), selected track-item ids per
+//   "sequence": the active sequence's id, name, edit line (ticks), end, selected track-item ids per
 //               group, and its items (id, kind, media, name, start, end, link group), video
 //               tracks first (null without a sequence);
 //   "undo": {"done": [oldest first], "undone": [next redo first]} action names;

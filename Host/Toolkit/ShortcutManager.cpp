@@ -15,8 +15,8 @@ struct StandardCommand {
   std::array<KeyStroke, 2> keys;  // unused slots have no key
 };
 
-const std::array<StandardCommand, 14>& StandardCommands() {
-  static const std::array<StandardCommand, 14> commands{{
+const std::array<StandardCommand, 19>& StandardCommands() {
+  static const std::array<StandardCommand, 19> commands{{
       {"cmd.edit.clear",
        kCommandClear,
        {KeyStroke(KeyCode::kDelete), KeyStroke(KeyCode::kBackspace)}},
@@ -41,6 +41,11 @@ const std::array<StandardCommand, 14>& StandardCommands() {
       {"cmd.file.dontsave", kCommandDontSave, {KeyStroke(), KeyStroke()}},
       {"cmd.file.cancelclose", kCommandCancelClose, {KeyStroke(), KeyStroke()}},
       {"cmd.file.quit", kCommandQuit, {KeyStroke(KeyCode::kQ, kKeyModifierCtrl), KeyStroke()}},
+      {"cmd.transport.playstop", kCommandPlayStop, {KeyStroke(KeyCode::kSpace), KeyStroke()}},
+      {"cmd.transport.gotostart", kCommandGoToStart, {KeyStroke(KeyCode::kHome), KeyStroke()}},
+      {"cmd.transport.gotoend", kCommandGoToEnd, {KeyStroke(KeyCode::kEnd), KeyStroke()}},
+      {"cmd.transport.stepback", kCommandStepBack, {KeyStroke(KeyCode::kLeft), KeyStroke()}},
+      {"cmd.transport.stepforward", kCommandStepForward, {KeyStroke(KeyCode::kRight), KeyStroke()}},
   }};
   return commands;
 }

@@ -20,3 +20,9 @@ inline constexpr CommandID kCommandSaveAs = 57604;  // "cmd.file.saveas": Ctrl+S
 inline constexpr CommandID kCommandDontSave = 57605;     // "cmd.file.dontsave"
 inline constexpr CommandID kCommandCancelClose = 57606;  // "cmd.file.cancelclose"
 inline constexpr CommandID kCommandQuit = 57665;         // "cmd.file.quit": Ctrl+Q
+// Playback of the active sequence; a focused view that takes these keys (a text field) keeps them.
+inline constexpr CommandID kCommandPlayStop = 11400;     // "cmd.transport.playstop": Space
+inline constexpr CommandID kCommandGoToStart = 11401;    // "cmd.transport.gotostart": Home
+inline constexpr CommandID kCommandGoToEnd = 11402;      // "cmd.transport.gotoend": End
+inline constexpr CommandID kCommandStepBack = 11403;     // "cmd.transport.stepback": Left
+inline constexpr CommandID kCommandStepForward = 11404;  // "cmd.transport.stepforward": Right

@@ -1,0 +1,43 @@
+cmake_minimum_required(VERSION 3.25)
+
+# Plays the demo in real time through the keys: the edit line moves by about the time waited
+# (generously bounded: sanitizer builds run slowly), stays put once stopped, and the keys step.
+#   -DPROGRAM=path  -DSCRIPT=file  -DOUT=dir
+file(REMOVE_RECURSE "${OUT}")
+file(MAKE_DIRECTORY "${OUT}")
+execute_process(COMMAND "${PROGRAM}" --headless --script "${SCRIPT}" --out "${OUT}"
+                RESULT_VARIABLE exit_code ERROR_VARIABLE err)
+if(NOT exit_code EQUAL 0 OR err MATCHES "warning:")
+  message(FATAL_ERROR "the script exited with ${exit_code}:\n${err}")
+endif()
+
+function(edit_line out dump)
+  file(READ "${OUT}/${dump}" json)
+  string(JSON time GET "${json}" sequence currentTime)
+  set(${out} ${time} PARENT_SCOPE)
+endfunction()
+
+set(second 254016000000)
+edit_line(played played.dump.json)
+edit_line(stopped stopped.dump.json)
+math(EXPR moved "${played} - ${second}")
+math(EXPR low "${second} * 3 / 10")
+math(EXPR high "${second} * 3")
+if(moved LESS low OR moved GREATER high)
+  message(FATAL_ERROR "playing for 600 ms moved the edit line by ${moved} ticks")
+endif()
+if(NOT stopped EQUAL played)
+  message(FATAL_ERROR "the edit line moved after playback stopped: ${played} then ${stopped}")
+endif()
+edit_line(stepped stepped.dump.json)
+math(EXPR twoFrames "${second} / 25 * 2")
+if(NOT stepped EQUAL twoFrames)
+  message(FATAL_ERROR "Home and two Right arrows give ${stepped}, not ${twoFrames}")
+endif()
+file(READ "${OUT}/end.dump.json" json)
+string(JSON end GET "${json}" sequence end)
+edit_line(beforeEnd end.dump.json)
+math(EXPR expected "${end} - ${second} / 25")
+if(NOT beforeEnd EQUAL expected)
+  message(FATAL_ERROR "End and a Left arrow give ${beforeEnd}, not ${expected}")
+endif()
