@@ -1,5 +1,5 @@
 # Every target bootstraps the machine first, so each is one command on a fresh Debian machine.
-.PHONY: bootstrap demo test dev bench fuzz format clean
+.PHONY: bootstrap demo test dev bench fuzz memory format clean
 
 bootstrap:
 	@scripts/bootstrap
@@ -30,6 +30,12 @@ fuzz: bootstrap
 	cmake --preset fuzz
 	cmake --build --preset fuzz
 	scripts/fuzz build/fuzz $(FUZZ_SECONDS)
+
+# Long use of the demo in a release build must keep the program's memory flat.
+memory: bootstrap
+	cmake --preset release
+	cmake --build --preset release
+	scripts/memory-check build/release/Apps/effectcontrols/effectcontrols
 
 format:
 	git ls-files '*.h' '*.cpp' | xargs clang-format -i

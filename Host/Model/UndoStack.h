@@ -70,7 +70,8 @@ class UndoStack {
 
   // Forgets every step (the model stays as it is, and so does whether it is saved).
   void Clear();
-  // The oldest steps are dropped beyond this many (at least 1).
+  // The oldest steps are dropped beyond this many (at least 1; 1000 unless set), which bounds the
+  // memory the history holds.
   void SetMaximumSteps(std::size_t steps);
   std::size_t GetMaximumSteps() const { return mMaximumSteps; }
 

@@ -1,5 +1,8 @@
 #include "Host/Shell/StateDumpWriter.h"
 
+#include <unistd.h>
+
+#include <fstream>
 #include <nlohmann/json.hpp>
 
 #include "Host/Messaging/Diagnostics.h"
@@ -66,6 +69,16 @@ ordered_json PanelJSON(const TabView& tab) {
   return j;
 }
 
+// The program's resident memory in KiB (Linux); 0 where it cannot be read.
+long long ResidentKiB() {
+  std::ifstream statm("/proc/self/statm");
+  long long pages = 0;
+  long long resident = 0;
+  if (!(statm >> pages >> resident))
+    return 0;
+  return resident * (::sysconf(_SC_PAGESIZE) / 1024);
+}
+
 ordered_json SequenceJSON(const Sequence& sequence) {
   ordered_json j;
   j["id"] = sequence.GetID();
@@ -124,6 +137,7 @@ std::string StateDumpWriter::Write(Application& application) {
   undo["done"] = stack != nullptr ? stack->GetUndoNames() : std::vector<std::string>();
   undo["undone"] = stack != nullptr ? stack->GetRedoNames() : std::vector<std::string>();
   root["undo"] = std::move(undo);
+  root["process"] = {{"residentKiB", ResidentKiB()}};
 
   const ProjectDocument* document = application.GetDocument();
   root["document"] = document != nullptr ? ordered_json{{"path", document->GetPath()},
