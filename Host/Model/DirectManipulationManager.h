@@ -47,8 +47,7 @@ class DirectManipulationManager {
   bool SetDirectManipulationFilter(const ComponentRef& component, const TrackItemRef& trackItem);
   // The active effect's controls are switched off or on again; another effect becomes active
   // with its controls shown.
-  bool ToggleDirectManipulationFilter(const ComponentRef& component,
-                                      const TrackItemRef& trackItem);
+  bool ToggleDirectManipulationFilter(const ComponentRef& component, const TrackItemRef& trackItem);
   void Clear() { SetDirectManipulationFilter(nullptr, nullptr); }
 
   const ComponentRef& GetFilter() const { return mComponent; }

@@ -479,7 +479,7 @@ class EffectControlsListView : public SubView, public Listener {
   void AutoSelectNthEmbeddedEffect();
   // Selects the rows of these components alone; those without a row are skipped.
   void SelectComponents(const std::vector<ComponentRef>& components);
-  // The click was pressed and moved beyond the threshold: the selection starts to move.
+  // A press at `point` moved beyond the threshold: the effect pressed starts to move.
   // Intrinsic, archived and read-only effects show the no-drop cursor and do not move.
   void DragSelection(Point point);
   bool HitTestRow(const std::shared_ptr<EffectItem>& row, Point point, KeyModifiers modifiers,

@@ -137,8 +137,8 @@ void EffectControlsListView::OnDeleteStatus(CommandID command, CommandStatus& st
   if (command == kCommandCut && mTarget.kind == kTargetTransitionComponent) {
     return;
   }
-  status.enabled = CanDeleteEffects() || (command == kCommandClear &&
-                                          mSelectedFilters.ContainsSubsidiaryItems());
+  status.enabled = CanDeleteEffects() ||
+                   (command == kCommandClear && mSelectedFilters.ContainsSubsidiaryItems());
 }
 
 void EffectControlsListView::OnCopyStatus(CommandStatus& status) const {
@@ -184,16 +184,16 @@ void EffectControlsListView::OnCommandStatus(CommandID command, CommandStatus& s
     case kEffectsEnabledCommand: {
       status.enabled = !readOnly && !mSelectedFilters.IsEmpty() && mTarget.kind == kTargetClip;
       const auto& entries = mSelectedFilters.GetEntries();
-      status.checked = !entries.empty() &&
-                       std::all_of(entries.begin(), entries.end(), [](const auto& e) {
-                         return e.component && e.component->IsEnabled();
-                       });
+      status.checked =
+          !entries.empty() && std::all_of(entries.begin(), entries.end(), [](const auto& e) {
+            return e.component && e.component->IsEnabled();
+          });
       break;
     }
     case kCommandClear:
     case kDeleteEffectCommand:
-      status.enabled = !readOnly && (CanDeleteEffects() ||
-                                     mSelectedFilters.ContainsSubsidiaryItems());
+      status.enabled =
+          !readOnly && (CanDeleteEffects() || mSelectedFilters.ContainsSubsidiaryItems());
       break;
     case kResetEffectCommand:
       status.enabled = !readOnly && !mSelectedFilters.IsEmpty() &&

@@ -290,8 +290,8 @@ bool EffectControlsListView::ClickedItem(Point point, KeyModifiers modifiers, Mo
   // at all may empty it (a later section can still be the one clicked).
   const HitTestOptions keep{.keepKeyframesOnMiss = true};
   bool hit = mVideoExpanded && HitTestAndSelect(mVideoItems, point, modifiers, button, keep);
-  hit = hit || (mGraphicsExpanded &&
-                HitTestAndSelect(mGraphicsItems, point, modifiers, button, keep));
+  hit = hit ||
+        (mGraphicsExpanded && HitTestAndSelect(mGraphicsItems, point, modifiers, button, keep));
   for (const auto& part : mAudioParts) {
     if (hit) {
       break;
@@ -490,13 +490,15 @@ void EffectControlsListView::MouseMoveSelf(Point point, KeyModifiers /*modifiers
                        std::abs(point.y - mPressPoint->y) <= kDragThreshold)) {
     return;
   }
+  const Point pressed = *mPressPoint;
   mPressPoint.reset();
   if (GetLocalBounds().Contains(point)) {
-    DragSelection(point);
+    DragSelection(pressed);
   }
 }
 
 void EffectControlsListView::DragSelection(Point point) {
+  // What moves is the row the press grabbed, wherever the pointer went since.
   const std::shared_ptr<EffectItem> row = FindItemFromPoint(point);
   auto* filter = dynamic_cast<FilterItem*>(row.get());
   if (filter == nullptr) {
@@ -537,8 +539,8 @@ void EffectControlsListView::UpdateDirectManipulation() {
   }
   // The change we make must not come back to us as a pick.
   RemoveListener(kDirectManipulationStation, *this);
-  const std::vector<ComponentRef> selected = GetSelectedComponentsWithOptions(
-      {.includeMasks = true, .includeParameterOwners = true});
+  const std::vector<ComponentRef> selected =
+      GetSelectedComponentsWithOptions({.includeMasks = true, .includeParameterOwners = true});
   ComponentRef chosen;
   TrackItemRef trackItem;
   if (!mSelectedFilters.IsEmpty()) {
