@@ -23,6 +23,7 @@
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Decals.h"
 #include "Host/Toolkit/ImageList.h"
+#include "Host/Toolkit/StandardCommands.h"
 
 namespace {
 
@@ -158,6 +159,35 @@ int EffectControlsKeyframeView::GetSelectedKeyframeCount() const {
     return 0;
   }
   return static_cast<int>(list->GetKeyframeSelection()->GetKeyframeCount());
+}
+
+bool EffectControlsKeyframeView::FindCommandStatus(CommandID command, CommandStatus& status) {
+  if (command == kCommandClear) {
+    status.enabled = GetSelectedKeyframeCount() > 0;
+    return true;
+  }
+  return SubView::FindCommandStatus(command, status);
+}
+
+bool EffectControlsKeyframeView::ObeyCommand(CommandID command) {
+  if (command == kCommandClear) {
+    DeleteSelectedKeyframes();
+    return true;
+  }
+  return SubView::ObeyCommand(command);
+}
+
+void EffectControlsKeyframeView::DeleteSelectedKeyframes() {
+  const auto list = mList.lock();
+  if (!list || !list->GetKeyframeSelection() || list->GetKeyframeSelection()->IsEmpty()) {
+    return;
+  }
+  // The selection is the list's and may be replaced by the rebuild an edit causes: keep it.
+  const std::shared_ptr<KeyframeMultiSelection> selection = list->GetKeyframeSelection();
+  if (selection->RemoveSelectionFromComponentParams() == EditStatus::Done) {
+    selection->Clear();
+    Invalidate();
+  }
 }
 
 void EffectControlsKeyframeView::PaintSelf(DC& dc) {

@@ -85,6 +85,11 @@ class EffectControlsKeyframeView : public SubView, public Listener {
   static constexpr int kSeparatorGrabWidth = 4;
   bool IsDraggingSeparator() const { return mDraggingSeparator; }
 
+  // Delete (the standard clear command) removes the selected keyframes as one undo step.
+  bool FindCommandStatus(CommandID command, CommandStatus& status) override;
+  bool ObeyCommand(CommandID command) override;
+  void DeleteSelectedKeyframes();
+
   void PaintSelf(DC& dc) override;
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
   void MouseMoveSelf(Point point, KeyModifiers modifiers) override;
