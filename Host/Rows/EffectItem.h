@@ -76,6 +76,9 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   virtual void Destroy();
   bool IsCreated() const { return mCreated; }
   bool IsDestroyed() const { return mDestroyed; }
+  // The controls the row adopted into its parent view (AdoptControl) and has not destroyed, in
+  // the order they were made. For inspection (state dumps); the row keeps owning them.
+  std::vector<std::shared_ptr<ViewBase>> GetControls() const;
 
   // --- Tree ---
   // Appends `child` (ignored when null, this row, or already someone's child). The child gets
@@ -244,6 +247,7 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   int ChildrenHeight() const;
 
  private:
+  std::vector<std::weak_ptr<ViewBase>> mControls;  // adopted controls; owned by their view
   void ShowChildren();
   void HideChildren();
 

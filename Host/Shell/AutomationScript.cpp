@@ -5,6 +5,8 @@
 #include <map>
 #include <sstream>
 
+#include "Host/Shell/HostTool.h"
+
 namespace {
 
 struct VerbInfo {
@@ -34,6 +36,9 @@ const std::map<std::string, VerbInfo, std::less<>>& VerbTable() {
       {"shot", {ScriptVerb::kShot, true}},
       {"dump", {ScriptVerb::kDump, true}},
       {"save", {ScriptVerb::kSave, true}},
+      {"tool", {ScriptVerb::kTool, false}},
+      {"open", {ScriptVerb::kOpen, false}},
+      {"reopen-panel", {ScriptVerb::kReopenPanel, false}},
   };
   return table;
 }
@@ -103,8 +108,12 @@ class LineParser {
   std::string Parse(std::string_view restOfLine) {
     switch (mCommand.verb) {
       case ScriptVerb::kSelect:
+      case ScriptVerb::kOpen:
         return ParseSelect();
+      case ScriptVerb::kTool:
+        return ParseTool();
       case ScriptVerb::kSelectNone:
+      case ScriptVerb::kReopenPanel:
       case ScriptVerb::kUndo:
       case ScriptVerb::kRedo:
         return ExpectNoArguments();
@@ -148,9 +157,25 @@ class LineParser {
     return mArgs.empty() ? std::string() : std::string(mVerbName) + " takes no arguments";
   }
 
+  std::string ParseTool() {
+    if (mArgs.size() != 1)
+      return Needs("one tool name");
+    if (!HostToolFromName(mArgs[0])) {
+      std::string names;
+      for (const auto& entry : kHostToolNames)
+        names += (names.empty() ? "" : ", ") + std::string(entry.first);
+      return "'" + std::string(mArgs[0]) + "' is not a tool (" + names + ")";
+    }
+    mCommand.text = std::string(mArgs[0]);
+    return {};
+  }
+
   std::string ParseSelect() {
-    if (mArgs.empty())
-      return Needs("at least one track-item id (or use select-none)");
+    if (mArgs.empty()) {
+      return mCommand.verb == ScriptVerb::kOpen
+                 ? Needs("at least one track-item id")
+                 : Needs("at least one track-item id (or use select-none)");
+    }
     for (auto word : mArgs) {
       auto id = ParseNumber<std::int64_t>(word);
       if (!id || *id < 0)

@@ -96,5 +96,12 @@ std::string ProgramOptions::Usage() {
          "  click|rclick|dblclick X Y [shift] [ctrl] [alt] | drag X1 Y1 X2 Y2 [steps N] [mods]\n"
          "  move X Y | wheel DY | key NAME [mods] | type TEXT\n"
          "  command ID-or-NAME | menu-answer ID-or-NAME|none | input-answer TEXT\n"
-         "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE\n";
+         "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE\n"
+         "What a user does outside the panel:\n"
+         "  tool NAME       pick a timeline tool (pointer, track-select-forward, ripple, roll,\n"
+         "                  rate-stretch, razor, slip, slide, pen, hand, zoom)\n"
+         "  open ID...      open track items as a double-click in the timeline does\n"
+         "  reopen-panel    close the front panel's tab and open it again\n"
+         "Dumps give each shown row's rectangle and its controls' in panel pixels, the keyframe\n"
+         "glyphs' centres, the selected keyframes, the pointer's cursor and the panel's tool.\n";
 }

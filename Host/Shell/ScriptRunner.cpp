@@ -13,6 +13,7 @@
 #include "Host/Model/Sequence.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Application.h"
+#include "Host/Shell/HostTool.h"
 #include "Host/Shell/ScriptInputRoute.h"
 #include "Host/Shell/StateDumpWriter.h"
 #include "Host/Shell/WorkspaceFrame.h"
@@ -160,6 +161,13 @@ std::string ScriptRunner::Execute(const ScriptCommand& command, ScriptRunResult&
       return RunDump(command, result);
     case ScriptVerb::kSave:
       return RunSave(command, result);
+    case ScriptVerb::kTool:
+      mApplication.SelectTool(*HostToolFromName(command.text));
+      return {};
+    case ScriptVerb::kOpen:
+      return RunOpen(command);
+    case ScriptVerb::kReopenPanel:
+      return RunReopenPanel();
   }
   return "unknown verb";
 }
@@ -168,6 +176,31 @@ std::string ScriptRunner::RunSelect(const ScriptCommand& command) {
   std::string error;
   if (!mApplication.SelectTrackItems(command.ids, &error))
     return error;
+  return {};
+}
+
+std::string ScriptRunner::RunOpen(const ScriptCommand& command) {
+  // A double-click in the timeline: the first click selects, the second opens.
+  std::string error;
+  if (!mApplication.SelectTrackItems(command.ids, &error))
+    return error;
+  const SequenceRef sequence = mApplication.GetActiveSequence();
+  std::vector<TrackItemRef> items;
+  for (const ObjectID id : command.ids)
+    items.push_back(sequence->FindTrackItem(id));
+  mApplication.OpenTrackItemSelection(std::move(items));
+  return {};
+}
+
+std::string ScriptRunner::RunReopenPanel() {
+  const TabView* front = mApplication.GetWorkspaceFrame().GetFrontTab();
+  if (front == nullptr)
+    return "there is no panel to close and reopen";
+  const std::string handler = front->GetHandlerID();
+  if (!mApplication.CloseTab(handler))
+    return "the panel '" + handler + "' refused to close";
+  if (mApplication.OpenTab(handler) == nullptr)
+    return "the panel '" + handler + "' did not open again";
   return {};
 }
 

@@ -71,6 +71,8 @@ class ScriptRunner {
   std::string Execute(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunSelect(const ScriptCommand& command);
   std::string RunTime(const ScriptCommand& command);
+  std::string RunOpen(const ScriptCommand& command);
+  std::string RunReopenPanel();
   std::string RunPointer(const ScriptCommand& command);
   std::string RunKey(const ScriptCommand& command);
   std::string RunCommand(const ScriptCommand& command, ScriptRunResult& result);

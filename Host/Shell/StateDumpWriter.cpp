@@ -9,12 +9,17 @@
 #include "Host/Shell/Application.h"
 #include "Host/Shell/StateDumpSource.h"
 #include "Host/Shell/WorkspaceFrame.h"
+#include "Host/Toolkit/Cursor.h"
 #include "Host/Toolkit/TabView.h"
 #include "Host/Toolkit/ViewHost.h"
 
 namespace {
 
 using nlohmann::ordered_json;
+
+ordered_json RectJSON(const StateDumpRect& rect) {
+  return {{"x", rect.x}, {"y", rect.y}, {"width", rect.width}, {"height", rect.height}};
+}
 
 ordered_json RowJSON(const StateDumpRow& row) {
   ordered_json j;
@@ -27,6 +32,15 @@ ordered_json RowJSON(const StateDumpRow& row) {
   j["selected"] = row.selected;
   j["setAside"] = row.setAside;
   j["shown"] = row.shown;
+  j["rect"] = row.rect ? RectJSON(*row.rect) : ordered_json();
+  ordered_json controls = ordered_json::array();
+  for (const auto& control : row.controls) {
+    controls.push_back({{"class", control.className},
+                        {"rect", RectJSON(control.rect)},
+                        {"visible", control.visible},
+                        {"enabled", control.enabled}});
+  }
+  j["controls"] = std::move(controls);
   return j;
 }
 
@@ -38,6 +52,15 @@ ordered_json KeyframeAreaJSON(const StateDumpKeyframeArea& area) {
   for (const auto& key : area.selectedKeyframes)
     keys.push_back({{"path", key.path}, {"time", key.time}});
   j["selectedKeyframes"] = std::move(keys);
+  ordered_json glyphs = ordered_json::array();
+  for (const auto& glyph : area.glyphs) {
+    glyphs.push_back({{"path", glyph.path},
+                      {"time", glyph.time},
+                      {"x", glyph.x},
+                      {"y", glyph.y},
+                      {"selected", glyph.selected}});
+  }
+  j["glyphs"] = std::move(glyphs);
   return j;
 }
 
@@ -112,6 +135,7 @@ std::string StateDumpWriter::Write(Application& application) {
   for (const TabView* tab : frame.GetTabs())
     tabs.push_back({{"handler", tab->GetHandlerID()}, {"name", tab->GetTabName()}});
   workspace["tabs"] = std::move(tabs);
+  workspace["cursor"] = std::string(CursorName(GetCurrentCursor()));
   root["workspace"] = std::move(workspace);
 
   const SequenceRef sequence = application.GetActiveSequence();

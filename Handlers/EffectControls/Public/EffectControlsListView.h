@@ -413,8 +413,9 @@ class EffectControlsListView : public SubView, public Listener {
 
   // --- State dump ---
   // Every row in display order (sections top to bottom, each row before its children) with
-  // its path of titles, class, geometry and state. Set-aside rows are listed too.
-  std::vector<StateDumpRow> GetDumpRows() const;
+  // its path of titles, class, geometry and state. Set-aside rows are listed too. `origin`:
+  // the list's top-left in the coordinates the rectangles are wanted in (the panel's).
+  std::vector<StateDumpRow> GetDumpRows(Point origin = {}) const;
 
   // --- Mouse (list coordinates) ---
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
@@ -486,7 +487,8 @@ class EffectControlsListView : public SubView, public Listener {
                   MouseButton button);
   bool IsMaskMultiSelectEnabled() const;
   void OpenEditMenu(Point point);
-  // Every row of the shown sections (video, graphics, audio parts of clips).
+  // The sections that hold selectable rows, in display order (graphics, video, the audio
+  // parts of clips).
   void ForEachSelectableList(const std::function<void(const EffectItemList&)>& visit) const;
   std::shared_ptr<FilterItem> FindFilterRow(const Component* component,
                                             const TrackItem* trackItem) const;

@@ -2,7 +2,13 @@
 // the effect list. Building, layout and painting live in the files named after them.
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 
+#include <cxxabi.h>
+
 #include <algorithm>
+#include <cstdlib>
+#include <memory>
+#include <string>
+#include <typeinfo>
 #include <utility>
 
 #include "Handlers/EffectControls/Src/AudioPartInfo.h"
@@ -54,8 +60,21 @@ bool IsValidLinkedTrackItems(const std::vector<TrackItemGroup>& groups) {
          video->GetLinkGroup() == audio->GetLinkGroup();
 }
 
+// "PictureButton" for a PictureButton; the mangled name when it cannot be read.
+std::string ClassNameOf(const ViewBase& view) {
+  const char* mangled = typeid(view).name();
+  int status = 0;
+  std::unique_ptr<char, void (*)(void*)> readable(
+      abi::__cxa_demangle(mangled, nullptr, nullptr, &status), std::free);
+  return status == 0 && readable ? std::string(readable.get()) : std::string(mangled);
+}
+
+StateDumpRect Offset(const Rect& rect, Point origin) {
+  return {rect.left + origin.x, rect.top + origin.y, rect.Width(), rect.Height()};
+}
+
 void AppendDumpRows(const std::shared_ptr<EffectItem>& row, std::vector<std::string> path,
-                    std::vector<StateDumpRow>& rows) {
+                    Point origin, std::vector<StateDumpRow>& rows) {
   path.push_back(row->GetName());
   StateDumpRow dump;
   dump.path = path;
@@ -67,9 +86,18 @@ void AppendDumpRows(const std::shared_ptr<EffectItem>& row, std::vector<std::str
   dump.selected = row->IsSelected();
   dump.setAside = row->IsSetAside();
   dump.shown = row->IsShown();
+  if (row->IsShown() && !row->IsSetAside()) {
+    dump.rect = Offset(Rect::FromSize(0, row->GetTop(), row->GetWidth(), row->OwnHeight()), origin);
+  }
+  for (const auto& control : row->GetControls()) {
+    dump.controls.push_back({.className = ClassNameOf(*control),
+                             .rect = Offset(control->GetBounds(), origin),
+                             .visible = control->IsVisible(),
+                             .enabled = control->IsEnabled()});
+  }
   rows.push_back(std::move(dump));
   for (const auto& child : row->GetItems()) {
-    AppendDumpRows(child, path, rows);
+    AppendDumpRows(child, path, origin, rows);
   }
 }
 
@@ -441,11 +469,11 @@ void EffectControlsListView::OnTimelineChanged(const PanelTimelineChangedMessage
 
 // --- State dump ---
 
-std::vector<StateDumpRow> EffectControlsListView::GetDumpRows() const {
+std::vector<StateDumpRow> EffectControlsListView::GetDumpRows(Point origin) const {
   std::vector<StateDumpRow> rows;
-  auto dumpList = [&rows](const EffectItemList& list) {
+  auto dumpList = [&rows, origin](const EffectItemList& list) {
     for (const auto& row : list) {
-      AppendDumpRows(row, {}, rows);
+      AppendDumpRows(row, {}, origin, rows);
     }
   };
   dumpList(mGraphicsItems);

@@ -148,8 +148,9 @@ void EffectControlsListView::AutoSelectNthEmbeddedEffect() {
 
 void EffectControlsListView::ForEachSelectableList(
     const std::function<void(const EffectItemList&)>& visit) const {
-  visit(mVideoItems);
+  // Display order: a Shift range runs down the list as the user sees it.
   visit(mGraphicsItems);
+  visit(mVideoItems);
   for (const auto& part : mAudioParts) {
     if (part->IsClipPart()) {
       visit(part->GetItems());
