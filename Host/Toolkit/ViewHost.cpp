@@ -123,7 +123,8 @@ void ViewHost::TakeCaptureAway() {
 }
 
 void ViewHost::NotifyCaptureLost(const std::shared_ptr<ViewBase>& view) {
-  if (view != nullptr && !view->IsDestroyed()) {
+  // A view being torn down has nothing left to roll back.
+  if (view != nullptr && !view->mDestroying) {
     view->MouseCaptureLostSelf();
   }
 }
