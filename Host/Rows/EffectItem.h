@@ -247,7 +247,6 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   int ChildrenHeight() const;
 
  private:
-  std::vector<std::weak_ptr<ViewBase>> mControls;  // adopted controls; owned by their view
   void ShowChildren();
   void HideChildren();
 
@@ -259,6 +258,8 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   std::weak_ptr<EffectItem> mParentItem;
   std::vector<std::shared_ptr<EffectItem>> mItems;
   std::shared_ptr<DisclosureTriangle> mTriangle;
+  // What AdoptControl gave the parent view; the subclasses' members own them.
+  std::vector<std::weak_ptr<ViewBase>> mControls;
 
   int mGroupLevel = 0;
   int mTop = 0;

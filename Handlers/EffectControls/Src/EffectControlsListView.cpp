@@ -1,5 +1,6 @@
-// Construction, listening, commands, selection, the shared time state and the state dump of
-// the effect list. Building, layout and painting live in the files named after them.
+// Construction, listening, command dispatch, the shared time state and the state dump of the
+// effect list. Building, layout, painting, selection and the effect commands live in the files
+// named after them.
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 
 #include <cxxabi.h>
@@ -252,12 +253,12 @@ void EffectControlsListView::ListenToMessage(const Message& message) {
   } else if (const auto* onOff = message.As<FilterOnOffAllChanged>()) {
     OnFilterOnOffAllChanged(onOff->enabled);
   } else if (const auto* added = message.As<EmbeddedEffectAdded>()) {
-    // The rebuild the insertion causes may come before or after this message.
+    // The rebuild the insertion causes may come before or after this message: select the
+    // effect now if it has a row, and again after the next build (that one only).
     if (FindFilterRow(added->component.get(), nullptr)) {
       SelectComponents({added->component});
-    } else {
-      mPendingSelection = {added->component};
     }
+    mPendingSelection = {added->component};
   } else if (const auto* picked = message.As<DirectManipulationFilterPickedMessage>()) {
     SelectDMFilterItem(picked->component);
   } else if (message.Is<ParameterControlChangedMessage>()) {

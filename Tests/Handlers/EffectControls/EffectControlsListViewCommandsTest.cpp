@@ -309,15 +309,17 @@ TEST_F(ListCommandsTest, AReadOnlyContainerSwallowsEveryCommand) {
   EXPECT_FALSE(Undo().CanUndo());
 }
 
-// A paste on one clip asked for its effect to be selected after the rebuild; the rebuild that
-// came instead was for another clip, which must not get a selection from it.
+// Regression: the request to select a pasted effect was kept as "the Nth effect", so the
+// rebuild of another clip selected that clip's Nth effect. It is kept as the effect itself now.
 TEST_F(ListCommandsTest, APendingSelectionDoesNotReachARebuildOfAnotherClip) {
   ShowClip();
   const TrackItemRef other =
       AddClip(v1, {Make(kMatchName_Motion), Make(kMatchName_Opacity), Make(kMatchName_Crop)},
               8 * kSecond, 12 * kSecond);
-  const ComponentRef notYetShown = Make(kMatchName_Crop);
-  BroadcastMessage(list->GetOwnStation(), EmbeddedEffectAdded(notYetShown));
+  BroadcastMessage(list->GetOwnStation(), EmbeddedEffectAdded(blur));
+  EXPECT_EQ(Selected(), Strings{"Gaussian Blur"});
+  // An effect that has no row yet waits for the next build, and only that one.
+  BroadcastMessage(list->GetOwnStation(), EmbeddedEffectAdded(Make(kMatchName_Crop)));
   Select({other});
   EXPECT_TRUE(Selected().empty());
   Select({clip});

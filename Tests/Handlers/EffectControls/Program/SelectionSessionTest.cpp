@@ -271,4 +271,23 @@ TEST_F(SelectionSession, DeletingAnAppliedEffectTogetherWithMotionRemovesOnlyThe
             json::array({"MZ.ComponentChainActions.RemoveMultipleFilters"}));
 }
 
+TEST_F(SelectionSession, AToolAnOpenedClipAndAReopenedPanelReachThePanel) {
+  ASSERT_TRUE(Run("outside", {
+                                 "tool pen",
+                                 "dump pen.dump.json",
+                                 "open 81",
+                                 "dump opened.dump.json",
+                                 "tool pointer",
+                                 "reopen-panel",
+                                 "dump reopened.dump.json",
+                             }));
+  EXPECT_EQ(Panel("pen.dump.json")["extra"]["toolMode"], "pen");
+  const json opened = Dump(dir / "opened.dump.json");
+  EXPECT_EQ(opened["sequence"]["selection"][0][0], 81);
+  EXPECT_FALSE(TopTitles(opened["panels"][0]).empty());
+  const json reopened = Panel("reopened.dump.json");
+  EXPECT_EQ(reopened["extra"]["toolMode"], "pointer");
+  EXPECT_EQ(TopTitles(reopened), TopTitles(opened["panels"][0]));
+}
+
 }  // namespace
