@@ -8,6 +8,7 @@
 #include "Host/Model/EditPermissions.h"
 #include "Host/Model/EffectClipboardItem.h"
 #include "Host/Model/ModelDescription.h"
+#include "Host/Model/TransitionData.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Toolkit/CommandStatus.h"
 #include "Host/Toolkit/StandardCommands.h"
@@ -324,6 +325,34 @@ TEST_F(ListCommandsTest, APendingSelectionDoesNotReachARebuildOfAnotherClip) {
   EXPECT_TRUE(Selected().empty());
   Select({clip});
   EXPECT_TRUE(Selected().empty());
+}
+
+TEST_F(ListCommandsTest, DeletingEffectsOfATransitionsOwnChainRemovesTheTransitionInOneStep) {
+  clip = AddClip(v1, {Make(kMatchName_Opacity)}, 0, 6 * kSecond);
+  TransitionData data;
+  data.matchName = "XO.KRVN CrossDissolve";
+  data.displayName = "Cross Dissolve";
+  const TrackItemRef transition =
+      TrackItem::CreateTransition(MediaType::Video, 5 * kSecond, 6 * kSecond, data);
+  transition->GetComponentChain()->Append(Make(kMatchName_Opacity));
+  transition->GetComponentChain()->Append(Make(kMatchName_GaussianBlur));
+  v1->AddItem(transition);
+  Open();
+  Select({transition});
+  ASSERT_EQ(list->GetTargetKind(), List::kTargetTransitionComponent);
+  ASSERT_EQ(list->GetVideoItems().Size(), 2u);
+  list->SelectItem(list->GetVideoItems().At(1), true);
+
+  EXPECT_FALSE(StatusOf(kCommandCut).enabled);
+  EXPECT_TRUE(StatusOf(kCommandClear).enabled);
+  const std::string before = DescribeForTest(*transition);
+  EXPECT_TRUE(list->ObeyCommand(kCommandClear));
+  EXPECT_EQ(v1->GetItems(), std::vector<TrackItemRef>{clip});
+  EXPECT_EQ(Undo().GetUndoNames().size(), 1u);
+  // Undo puts the transition back with its effects (the clip selection is not history).
+  ASSERT_TRUE(Undo().Undo());
+  EXPECT_EQ(v1->GetItems(), (std::vector<TrackItemRef>{clip, transition}));
+  EXPECT_EQ(DescribeForTest(*transition), before);
 }
 
 TEST_F(ListCommandsTest, SavingAPresetNeedsASelectionWithoutMasks) {
