@@ -146,8 +146,10 @@ void Component::AddParam(const ComponentParamRef& param) {
 void Component::SetMasks(std::vector<ComponentRef> masks) {
   std::set<const Component*> seen;
   for (const ComponentRef& mask : masks) {
-    if (!HOST_VERIFY(mask && mask.get() != this && mask->GetChain() == nullptr &&
-                         (mask->mMaskOwner == nullptr || mask->mMaskOwner == this) &&
+    // A mask this effect owns already stays; any other must be free (in no chain, no owner).
+    if (!HOST_VERIFY(mask && mask.get() != this &&
+                         (mask->mMaskOwner == this ||
+                          (mask->mMaskOwner == nullptr && mask->mChain == nullptr)) &&
                          seen.insert(mask.get()).second,
                      "Invalid mask list")) {
       return;

@@ -8,6 +8,7 @@
 #include "Host/Messaging/PropertyList.h"
 #include "Host/Model/Action.h"
 #include "Host/Model/Clipboard.h"
+#include "Host/Model/DirectManipulationManager.h"
 #include "Host/Model/ModelObject.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/ModelTypes.h"
@@ -39,6 +40,8 @@ class Project : public ModelObject {
 
   UndoStack& GetUndoStack() { return mUndoStack; }
   Clipboard& GetClipboard() { return mClipboard; }
+  // Whose on-screen controls the monitor shows; announced on kDirectManipulationStation.
+  DirectManipulationManager& GetDirectManipulationManager() { return mDirectManipulation; }
   PropertyList& GetProperties() { return mProperties; }
   const PropertyList& GetProperties() const { return mProperties; }
 
@@ -68,6 +71,7 @@ class Project : public ModelObject {
   SequenceRef mActiveSequence;
   UndoStack mUndoStack;
   Clipboard mClipboard;
+  DirectManipulationManager mDirectManipulation;
   PropertyList mProperties;
   bool mReadOnly = false;
 };

@@ -118,6 +118,10 @@ std::string UndoStack::GetUndoName() const {
   return mDone.empty() ? std::string() : mDone.back()->GetName();
 }
 
+std::string UndoStack::GetUndoText() const {
+  return mDone.empty() ? std::string() : mDone.back()->GetUndoText();
+}
+
 std::string UndoStack::GetRedoName() const {
   return mUndone.empty() ? std::string() : mUndone.back()->GetName();
 }

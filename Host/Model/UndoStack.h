@@ -37,6 +37,8 @@ class UndoStack {
   // Name of the step Undo (Redo) would take back (do again); empty when none.
   std::string GetUndoName() const;
   std::string GetRedoName() const;
+  // What the user reads for the step Undo would take back (its name unless it has a text).
+  std::string GetUndoText() const;
   // Names of the done steps, oldest first; of the undone steps, the next redo first.
   std::vector<std::string> GetUndoNames() const;
   std::vector<std::string> GetRedoNames() const;

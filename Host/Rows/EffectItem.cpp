@@ -267,7 +267,19 @@ bool EffectItem::AdoptView(const std::shared_ptr<ViewBase>& view) {
   }
   view->Hide();
   parent->AddChild(view);
+  std::erase_if(mControls, [](const std::weak_ptr<ViewBase>& c) { return c.expired(); });
+  mControls.push_back(view);
   return true;
+}
+
+std::vector<std::shared_ptr<ViewBase>> EffectItem::GetControls() const {
+  std::vector<std::shared_ptr<ViewBase>> controls;
+  for (const auto& weak : mControls) {
+    if (auto control = weak.lock(); control && !control->IsDestroyed()) {
+      controls.push_back(std::move(control));
+    }
+  }
+  return controls;
 }
 
 void EffectItem::DestroyView(ViewBase& view) {

@@ -76,6 +76,9 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   virtual void Destroy();
   bool IsCreated() const { return mCreated; }
   bool IsDestroyed() const { return mDestroyed; }
+  // The controls the row adopted into its parent view (AdoptControl) and has not destroyed, in
+  // the order they were made. For inspection (state dumps); the row keeps owning them.
+  std::vector<std::shared_ptr<ViewBase>> GetControls() const;
 
   // --- Tree ---
   // Appends `child` (ignored when null, this row, or already someone's child). The child gets
@@ -255,6 +258,8 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   std::weak_ptr<EffectItem> mParentItem;
   std::vector<std::shared_ptr<EffectItem>> mItems;
   std::shared_ptr<DisclosureTriangle> mTriangle;
+  // What AdoptControl gave the parent view; the subclasses' members own them.
+  std::vector<std::weak_ptr<ViewBase>> mControls;
 
   int mGroupLevel = 0;
   int mTop = 0;

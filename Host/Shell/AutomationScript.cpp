@@ -5,6 +5,8 @@
 #include <map>
 #include <sstream>
 
+#include "Host/Shell/HostTool.h"
+
 namespace {
 
 struct VerbInfo {
@@ -36,6 +38,10 @@ const std::map<std::string, VerbInfo, std::less<>>& VerbTable() {
       {"save", {ScriptVerb::kSave, true}},
       {"close", {ScriptVerb::kClose, false}},
       {"wait", {ScriptVerb::kWait, false}},
+      {"memory", {ScriptVerb::kMemory, true}},
+      {"tool", {ScriptVerb::kTool, false}},
+      {"open", {ScriptVerb::kOpen, false}},
+      {"reopen-panel", {ScriptVerb::kReopenPanel, false}},
   };
   return table;
 }
@@ -105,8 +111,12 @@ class LineParser {
   std::string Parse(std::string_view restOfLine) {
     switch (mCommand.verb) {
       case ScriptVerb::kSelect:
+      case ScriptVerb::kOpen:
         return ParseSelect();
+      case ScriptVerb::kTool:
+        return ParseTool();
       case ScriptVerb::kSelectNone:
+      case ScriptVerb::kReopenPanel:
       case ScriptVerb::kUndo:
       case ScriptVerb::kRedo:
       case ScriptVerb::kClose:
@@ -139,6 +149,7 @@ class LineParser {
       case ScriptVerb::kShot:
       case ScriptVerb::kDump:
       case ScriptVerb::kSave:
+      case ScriptVerb::kMemory:
         return ParsePath(restOfLine);
     }
     return "unknown verb";
@@ -153,9 +164,25 @@ class LineParser {
     return mArgs.empty() ? std::string() : std::string(mVerbName) + " takes no arguments";
   }
 
+  std::string ParseTool() {
+    if (mArgs.size() != 1)
+      return Needs("one tool name");
+    if (!HostToolFromName(mArgs[0])) {
+      std::string names;
+      for (const auto& entry : kHostToolNames)
+        names += (names.empty() ? "" : ", ") + std::string(entry.first);
+      return "'" + std::string(mArgs[0]) + "' is not a tool (" + names + ")";
+    }
+    mCommand.text = std::string(mArgs[0]);
+    return {};
+  }
+
   std::string ParseSelect() {
-    if (mArgs.empty())
-      return Needs("at least one track-item id (or use select-none)");
+    if (mArgs.empty()) {
+      return mCommand.verb == ScriptVerb::kOpen
+                 ? Needs("at least one track-item id")
+                 : Needs("at least one track-item id (or use select-none)");
+    }
     for (auto word : mArgs) {
       auto id = ParseNumber<std::int64_t>(word);
       if (!id || *id < 0)

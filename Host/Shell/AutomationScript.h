@@ -33,6 +33,10 @@ enum class ScriptVerb {
   kSave,
   kClose,
   kWait,
+  kMemory,
+  kTool,
+  kOpen,
+  kReopenPanel,
 };
 
 // Key modifier bits of the host's modifier word.
@@ -43,13 +47,13 @@ inline constexpr std::uint32_t kScriptAlt = 16;
 struct ScriptCommand {
   ScriptVerb verb = ScriptVerb::kUndo;
   int line = 0;                   // 1-based line in the script
-  std::vector<std::int64_t> ids;  // select: track-item ids
+  std::vector<std::int64_t> ids;  // select, open: track-item ids
   std::vector<int> numbers;       // coordinates, wheel delta, size; drag: x1 y1 x2 y2
   int steps = 1;                  // drag: pointer moves between press and release
   std::uint32_t modifiers = 0;    // kScriptShift | kScriptCtrl | kScriptAlt
   // time: ticks or "hh:mm:ss:ff" (resolved against the sequence's frame rate when run);
   // key: key name; type/input-answer: text; command: id or name; menu-answer: id, name or
-  // "none"; shot/dump/save: file path.
+  // "none"; shot/dump/save: file path; tool: the tool's name (HostTool.h).
   std::string text;
 };
 

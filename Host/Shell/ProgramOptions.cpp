@@ -116,7 +116,14 @@ std::string ProgramOptions::Usage() {
          "  command ID-or-NAME | menu-answer ID-or-NAME|none | input-answer TEXT\n"
          "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE (a copy)\n"
          "  close (as the window's close button: asks to save changes; ends the script)\n"
-         "  wait MS (real time passes: playback runs)\n";
+         "  wait MS (real time passes: playback runs) | memory FILE.json (resident size)\n"
+         "What a user does outside the panel:\n"
+         "  tool NAME       pick a timeline tool (pointer, track-select-forward, ripple, roll,\n"
+         "                  rate-stretch, razor, slip, slide, pen, hand, zoom)\n"
+         "  open ID...      open track items as a double-click in the timeline does\n"
+         "  reopen-panel    close the front panel's tab and open it again\n"
+         "Dumps give each shown row's rectangle and its controls' in panel pixels, the keyframe\n"
+         "glyphs' centres, the selected keyframes, the pointer's cursor and the panel's tool.\n";
 }
 
 void ProgramOptions::ApplyPreferences(PropertyList& properties) const {

@@ -1,5 +1,7 @@
 #include "Host/Shell/ScriptRunner.h"
 
+#include <unistd.h>
+
 #include <algorithm>
 #include <charconv>
 #include <chrono>
@@ -15,6 +17,7 @@
 #include "Host/Model/Sequence.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Application.h"
+#include "Host/Shell/HostTool.h"
 #include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ScriptInputRoute.h"
 #include "Host/Shell/StateDumpWriter.h"
@@ -175,6 +178,15 @@ std::string ScriptRunner::Execute(const ScriptCommand& command, ScriptRunResult&
     case ScriptVerb::kWait:
       RunWait(command.numbers.front());
       return {};
+    case ScriptVerb::kMemory:
+      return RunMemory(command, result);
+    case ScriptVerb::kTool:
+      mApplication.SelectTool(*HostToolFromName(command.text));
+      return {};
+    case ScriptVerb::kOpen:
+      return RunOpen(command);
+    case ScriptVerb::kReopenPanel:
+      return RunReopenPanel();
   }
   return "unknown verb";
 }
@@ -183,6 +195,31 @@ std::string ScriptRunner::RunSelect(const ScriptCommand& command) {
   std::string error;
   if (!mApplication.SelectTrackItems(command.ids, &error))
     return error;
+  return {};
+}
+
+std::string ScriptRunner::RunOpen(const ScriptCommand& command) {
+  // A double-click in the timeline: the first click selects, the second opens.
+  std::string error;
+  if (!mApplication.SelectTrackItems(command.ids, &error))
+    return error;
+  const SequenceRef sequence = mApplication.GetActiveSequence();
+  std::vector<TrackItemRef> items;
+  for (const ObjectID id : command.ids)
+    items.push_back(sequence->FindTrackItem(id));
+  mApplication.OpenTrackItemSelection(std::move(items));
+  return {};
+}
+
+std::string ScriptRunner::RunReopenPanel() {
+  const TabView* front = mApplication.GetWorkspaceFrame().GetFrontTab();
+  if (front == nullptr)
+    return "there is no panel to close and reopen";
+  const std::string handler = front->GetHandlerID();
+  if (!mApplication.CloseTab(handler))
+    return "the panel '" + handler + "' refused to close";
+  if (mApplication.OpenTab(handler) == nullptr)
+    return "the panel '" + handler + "' did not open again";
   return {};
 }
 
@@ -401,6 +438,25 @@ std::string ScriptRunner::RunSave(const ScriptCommand& command, ScriptRunResult&
   std::string error;
   if (!mProjectSaver(*project, path, &error))
     return "cannot save '" + path + "': " + (error.empty() ? "unknown error" : error);
+  result.written.push_back(path);
+  return {};
+}
+
+std::string ScriptRunner::RunMemory(const ScriptCommand& command, ScriptRunResult& result) {
+  // Resident pages from /proc (Linux); the undo history is what long editing keeps.
+  std::ifstream statm("/proc/self/statm");
+  long long pages = 0;
+  long long resident = 0;
+  if (!(statm >> pages >> resident))
+    return "the program's memory cannot be read here (no /proc/self/statm)";
+  const UndoStack* stack = mApplication.GetUndoStack();
+  const std::string text =
+      "{\"residentKiB\": " + std::to_string(resident * (::sysconf(_SC_PAGESIZE) / 1024)) +
+      ", \"undoSteps\": " + std::to_string(stack != nullptr ? stack->GetUndoNames().size() : 0) +
+      "}\n";
+  const std::string path = ResolvePath(command.text);
+  if (std::string error = WriteFile(path, text); !error.empty())
+    return error;
   result.written.push_back(path);
   return {};
 }

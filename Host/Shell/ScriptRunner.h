@@ -72,12 +72,16 @@ class ScriptRunner {
   std::string Execute(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunSelect(const ScriptCommand& command);
   std::string RunTime(const ScriptCommand& command);
+  std::string RunOpen(const ScriptCommand& command);
+  std::string RunReopenPanel();
   std::string RunPointer(const ScriptCommand& command);
   std::string RunKey(const ScriptCommand& command);
   std::string RunCommand(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunMenuAnswer(const ScriptCommand& command);
   std::string RunUndoRedo(bool undo);
   std::string RunShot(const ScriptCommand& command, ScriptRunResult& result);
+  // Writes the program's resident memory and the undo history's length as JSON.
+  std::string RunMemory(const ScriptCommand& command, ScriptRunResult& result);
   // Lets `milliseconds` of real time pass, delivering posted work (playback steps) meanwhile.
   void RunWait(int milliseconds);
   // Asks to close the project as the window's close button does (a popup when it changed).

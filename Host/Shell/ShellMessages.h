@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "Host/Messaging/Message.h"
+#include "Host/Model/DirectManipulationManager.h"  // kDirectManipulationStation
 #include "Host/Model/ModelRefs.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/TrackItem.h"
@@ -15,7 +16,6 @@
 inline constexpr const char* kSequenceActivationStation = "Host.SequenceActivation";
 inline constexpr const char* kTrackItemActivationStation = "Host.TrackItemActivation";
 inline constexpr const char* kMasterClipActivationStation = "Host.MasterClipActivation";
-inline constexpr const char* kDirectManipulationStation = "Host.DirectManipulation";
 inline constexpr const char* kToolStation = "Host.Tools";
 
 // --- Sequence-activation station ---

@@ -13,12 +13,17 @@
 #include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/StateDumpSource.h"
 #include "Host/Shell/WorkspaceFrame.h"
+#include "Host/Toolkit/Cursor.h"
 #include "Host/Toolkit/TabView.h"
 #include "Host/Toolkit/ViewHost.h"
 
 namespace {
 
 using nlohmann::ordered_json;
+
+ordered_json RectJSON(const StateDumpRect& rect) {
+  return {{"x", rect.x}, {"y", rect.y}, {"width", rect.width}, {"height", rect.height}};
+}
 
 ordered_json RowJSON(const StateDumpRow& row) {
   ordered_json j;
@@ -31,6 +36,15 @@ ordered_json RowJSON(const StateDumpRow& row) {
   j["selected"] = row.selected;
   j["setAside"] = row.setAside;
   j["shown"] = row.shown;
+  j["rect"] = row.rect ? RectJSON(*row.rect) : ordered_json();
+  ordered_json controls = ordered_json::array();
+  for (const auto& control : row.controls) {
+    controls.push_back({{"class", control.className},
+                        {"rect", RectJSON(control.rect)},
+                        {"visible", control.visible},
+                        {"enabled", control.enabled}});
+  }
+  j["controls"] = std::move(controls);
   return j;
 }
 
@@ -42,6 +56,15 @@ ordered_json KeyframeAreaJSON(const StateDumpKeyframeArea& area) {
   for (const auto& key : area.selectedKeyframes)
     keys.push_back({{"path", key.path}, {"time", key.time}});
   j["selectedKeyframes"] = std::move(keys);
+  ordered_json glyphs = ordered_json::array();
+  for (const auto& glyph : area.glyphs) {
+    glyphs.push_back({{"path", glyph.path},
+                      {"time", glyph.time},
+                      {"x", glyph.x},
+                      {"y", glyph.y},
+                      {"selected", glyph.selected}});
+  }
+  j["glyphs"] = std::move(glyphs);
   return j;
 }
 
@@ -67,16 +90,6 @@ ordered_json PanelJSON(const TabView& tab) {
     std::visit([&, &k = key](const auto& v) { extra[k] = v; }, value);
   j["extra"] = std::move(extra);
   return j;
-}
-
-// The program's resident memory in KiB (Linux); 0 where it cannot be read.
-long long ResidentKiB() {
-  std::ifstream statm("/proc/self/statm");
-  long long pages = 0;
-  long long resident = 0;
-  if (!(statm >> pages >> resident))
-    return 0;
-  return resident * (::sysconf(_SC_PAGESIZE) / 1024);
 }
 
 ordered_json SequenceJSON(const Sequence& sequence) {
@@ -127,6 +140,7 @@ std::string StateDumpWriter::Write(Application& application) {
   for (const TabView* tab : frame.GetTabs())
     tabs.push_back({{"handler", tab->GetHandlerID()}, {"name", tab->GetTabName()}});
   workspace["tabs"] = std::move(tabs);
+  workspace["cursor"] = std::string(CursorName(GetCurrentCursor()));
   root["workspace"] = std::move(workspace);
 
   const SequenceRef sequence = application.GetActiveSequence();
@@ -137,7 +151,6 @@ std::string StateDumpWriter::Write(Application& application) {
   undo["done"] = stack != nullptr ? stack->GetUndoNames() : std::vector<std::string>();
   undo["undone"] = stack != nullptr ? stack->GetRedoNames() : std::vector<std::string>();
   root["undo"] = std::move(undo);
-  root["process"] = {{"residentKiB", ResidentKiB()}};
 
   const ProjectDocument* document = application.GetDocument();
   root["document"] = document != nullptr ? ordered_json{{"path", document->GetPath()},

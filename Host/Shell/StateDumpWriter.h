@@ -10,7 +10,6 @@ class Application;
 //               group, and its items (id, kind, media, name, start, end, link group), video
 //               tracks first (null without a sequence);
 //   "undo": {"done": [oldest first], "undone": [next redo first]} action names;
-//   "process": {"residentKiB": the program's resident memory};
 //   "document": the project's file ("" when none yet), whether it changed since it was saved, the
 //               window title and why the last save failed ("" when it worked) (null without one);
 //   "assertions": the recorded debug assertions (message, condition, file, line, function, count);

@@ -157,6 +157,10 @@ class ViewBase : public Commander, public std::enable_shared_from_this<ViewBase>
   virtual void RightButtonDownSelf(Point /*point*/, KeyModifiers /*modifiers*/) {}
   virtual void RightButtonUpSelf(Point /*point*/, KeyModifiers /*modifiers*/) {}
   virtual void MouseMoveSelf(Point /*point*/, KeyModifiers /*modifiers*/) {}
+  // The capture ended without the view's own ReleaseMouse: another view captured, the view
+  // was hidden or removed, or a drag started. A drag in progress rolls back here; the view
+  // no longer has the capture when this runs. Not called while the view is destroyed.
+  virtual void MouseCaptureLostSelf() {}
   // The pointer left the view (or went to a child of it) while nothing was captured.
   virtual void MouseLeaveSelf() {}
   // Asked before each uncaptured mouse move, from the view under the pointer up to the root;

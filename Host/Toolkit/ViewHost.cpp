@@ -109,7 +109,24 @@ std::shared_ptr<ViewBase> ViewHost::MouseTarget(Point point) const {
 }
 
 void ViewHost::SetCapture(ViewBase& view) {
+  std::shared_ptr<ViewBase> previous = mCapture.lock();
   mCapture = view.weak_from_this();
+  if (previous != nullptr && previous.get() != &view) {
+    NotifyCaptureLost(previous);
+  }
+}
+
+void ViewHost::TakeCaptureAway() {
+  std::shared_ptr<ViewBase> previous = mCapture.lock();
+  mCapture.reset();
+  NotifyCaptureLost(previous);
+}
+
+void ViewHost::NotifyCaptureLost(const std::shared_ptr<ViewBase>& view) {
+  // A view being torn down has nothing left to roll back.
+  if (view != nullptr && !view->mDestroying) {
+    view->MouseCaptureLostSelf();
+  }
 }
 
 void ViewHost::ReleaseCapture(ViewBase& view) {
@@ -121,7 +138,7 @@ void ViewHost::ReleaseCapture(ViewBase& view) {
 void ViewHost::ForgetViewsIn(ViewBase& branch) {
   if (const std::shared_ptr<ViewBase> captured = mCapture.lock();
       captured != nullptr && branch.Contains(*captured)) {
-    mCapture.reset();
+    TakeCaptureAway();
   }
   if (const std::shared_ptr<ViewBase> hovered = mHover.lock();
       hovered != nullptr && branch.Contains(*hovered)) {
@@ -416,7 +433,7 @@ bool ViewHost::StartDrag(std::shared_ptr<const DataObject> data, DropEffect allo
       !HOST_VERIFY(mDrag == nullptr, "A drag is already running")) {
     return false;
   }
-  mCapture.reset();
+  TakeCaptureAway();
   mDrag = std::make_unique<DragDrop>(*this, std::move(data), allowedEffects, std::move(source),
                                      std::move(onFinished));
   if (mMousePoint) {

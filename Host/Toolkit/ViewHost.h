@@ -115,6 +115,9 @@ class ViewHost : public Commander {
   void NoteInput(Point point, KeyModifiers modifiers);
   void SetCapture(ViewBase& view);
   void ReleaseCapture(ViewBase& view);
+  // Ends the capture for a reason other than the view's own release and tells the view.
+  void TakeCaptureAway();
+  static void NotifyCaptureLost(const std::shared_ptr<ViewBase>& view);
   // Forgets capture, hover and drop target when they lie in `branch`.
   void ForgetViewsIn(ViewBase& branch);
   void UpdateHover(const std::shared_ptr<ViewBase>& view);

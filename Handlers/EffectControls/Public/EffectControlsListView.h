@@ -20,13 +20,17 @@
 #include "Host/Time/FrameRate.h"
 #include "Host/Time/TickTime.h"
 #include "Host/Time/TimePoint.h"
+#include "Host/Toolkit/Events.h"
 #include "Host/Toolkit/Font.h"
 #include "Host/Toolkit/ImageList.h"
 #include "Host/Toolkit/KeyModifiers.h"
 #include "Host/Toolkit/SubView.h"
 
 class AudioPartInfo;
+class ClipboardItem;
 class DC;
+class DirectManipulationManager;
+class EffectClipboardItem;
 class EffectControlsListScroller;
 class EffectItem;
 class FilterItem;
@@ -35,6 +39,7 @@ class MultiPictureButton;
 struct EffectRowRules;
 class PanelTimeline;
 struct PanelTimelineChangedMessage;
+struct CommandStatus;
 struct ParameterControlInfo;
 struct PlannedRow;
 enum class ScrollCode : std::int32_t;
@@ -55,6 +60,11 @@ enum EffectControlsListViewStyle : std::uint32_t {
   kStyleWideParameterNames = 0x2000,  // parameter names start at 10 px, end at 3/4 of the width
   kStyleNoXOTextExpander = 0x4000,    // no editable-text expander button
   kStyleNoFilterIndent = 0x8000,      // effect rows have no indent of their own
+};
+
+// How EffectControlsListView::HitTestAndSelect treats a miss.
+struct ListHitTestOptions {
+  bool keepKeyframesOnMiss = false;
 };
 
 // The left half of the effect controls panel: a scrolling list of sections (editable text,
@@ -99,6 +109,12 @@ class EffectControlsListView : public SubView, public Listener {
   static constexpr CommandID kAudioExpanderCommand = 18500;
   static constexpr CommandID kPlayAudioPartCommand = 18550;
   static constexpr CommandID kTextExpanderCommand = 19050;
+  // The effect commands the panel view routes to the list (besides the standard edit ones).
+  static constexpr CommandID kDeleteAllEffectsCommand = 11541;
+  static constexpr CommandID kSavePresetCommand = 18002;
+  static constexpr CommandID kEffectsEnabledCommand = 18003;
+  static constexpr CommandID kDeleteEffectCommand = 18005;
+  static constexpr CommandID kResetEffectCommand = 18300;
   static constexpr int kMaxAudioParts = 50;
 
   // `parent`: where the list's commands go that it does not handle (the panel view; not owned).
@@ -229,6 +245,118 @@ class EffectControlsListView : public SubView, public Listener {
   void SelectParameter(const std::shared_ptr<EffectItem>& row, bool select);
   // Empties both selections and every row's flag; announces it when something was selected.
   void ClearSelection();
+  // Only this parameter is selected (effects and other parameters are not).
+  void SelectParameterExclusively(const std::shared_ptr<EffectItem>& row);
+  // Selects every effect from the anchor to `row` in display order, both included; the anchor
+  // is the selected effect nearest to `row` (the one before it when the click lies between two
+  // selected effects). The keyframe selection is emptied.
+  void ShiftClickSelection(const std::shared_ptr<EffectItem>& row);
+
+  // --- Selection queries ---
+  // What GetSelectedComponentsWithOptions includes besides the selected effects.
+  struct SelectedComponentOptions {
+    bool includeMasks = false;  // selected masks (subsidiary entries)
+    // With no effect selected: the effects whose parameters are selected.
+    bool includeParameterOwners = false;
+  };
+  // The selected effects that are no masks, in selection order, with their track items.
+  void GetSelectedComponents(std::vector<ComponentRef>& components,
+                             std::vector<TrackItemRef>& trackItems) const;
+  std::vector<ComponentRef> GetSelectedComponentsWithOptions(
+      const SelectedComponentOptions& options) const;
+  // The selected effects (masks included) that belong to `chain`.
+  void GetSelectedComponentsFromComponentChain(const ComponentChain& chain,
+                                               std::vector<ComponentRef>& components,
+                                               std::vector<TrackItemRef>& trackItems) const;
+  // The selected effect when exactly one is selected, else null.
+  ComponentRef GetSingleSelectComponent() const;
+  // False when nothing is selected.
+  bool FirstSelectedComponent(ComponentRef& component, TrackItemRef& trackItem) const;
+  bool AtLeastOneFilterSelected() const { return !mSelectedFilters.IsEmpty(); }
+  bool IsFilterSelected() const { return !mSelectedFilters.IsEmpty(); }
+  bool IsOneFilterSelected() const { return mSelectedFilters.Size() == 1; }
+  bool SelectionContainsSubsidiaryItems() const {
+    return mSelectedFilters.ContainsSubsidiaryItems();
+  }
+
+  // --- Hit testing (list coordinates) ---
+  static constexpr int kFolderHitBandHeight = 18;
+  static constexpr int kDragThreshold = 2;
+  // A parameter's name ends this far before the middle of the list.
+  static constexpr int kParameterNameEndBeforeMiddle = 20;
+  static constexpr const char* kEditMenuName = "HandlerEffectControls_Edit_Menu";
+  // Hit-tests the shown sections in display order and changes the selections as the click
+  // asks; opens the edit menu for a right click. True when a row was hit.
+  bool ClickedItem(Point point, KeyModifiers modifiers, MouseButton button);
+  // The rows of one section. When no row is hit, the keyframe selection is emptied unless
+  // the options keep it (a later section may still be hit).
+  using HitTestOptions = ListHitTestOptions;
+  bool HitTestAndSelect(const EffectItemList& list, Point point, KeyModifiers modifiers,
+                        MouseButton button, const HitTestOptions& options = {});
+  // A click on an effect row's title band.
+  bool HitFilter(const std::shared_ptr<EffectItem>& row, Point point, KeyModifiers modifiers,
+                 MouseButton button);
+  // A click on a parameter row: a hit only on its name.
+  bool HitParam(const std::shared_ptr<EffectItem>& row, Point point, KeyModifiers modifiers,
+                MouseButton button);
+  // The name area of a parameter row (empty when the list is too narrow for one).
+  Rect GetParameterNameRect(const EffectItem& row) const;
+  // Whether the point lies in a row's custom user interface.
+  bool HitTestCustomUIRectangles(Point point) const;
+  // The deepest shown row whose own band holds the point, or null.
+  std::shared_ptr<EffectItem> FindItemFromPoint(Point point) const;
+  // Whether the point lies in the zone at the right edge that drags the separator.
+  bool IsInSeparatorZone(Point point) const;
+  bool IsDraggingSeparator() const { return mSeparatorDragging; }
+  bool IsHoveringSeparator() const { return mSeparatorHovering; }
+  void SetSeparatorEnabled(bool enabled) { mSeparatorEnabled = enabled; }
+
+  // --- Direct manipulation (the monitor's on-screen controls) ---
+  // Makes the selected effect with on-screen controls the host's direct-manipulation effect,
+  // else the effect owning the selected parameters, else none.
+  void UpdateDirectManipulation();
+  // The host reports the user picked `component`'s on-screen controls: select its row alone.
+  void SelectDMFilterItem(const ComponentRef& component);
+  // The effect that owns the selected parameters (the first when several); null when none.
+  ComponentRef GetDirectManipulationComponent() const;
+  // The project's manager; null with no target.
+  DirectManipulationManager* GetDirectManipulationManager() const;
+
+  // --- Effect commands ---
+  // Each does nothing on a read-only container. The On... operations return whether they had
+  // something to act on (the panel view passes delete and paste on to the keyframe area when
+  // the list had not).
+  bool OnDelete();
+  bool OnDeleteEffect() { return OnDelete(); }
+  bool OnCut();
+  bool OnCopy();
+  bool OnPaste();
+  void OnSelectAll();
+  void OnDeselectAll() { ClearSelection(); }
+  void OnResetEffect();
+  void OnEffectEnabled();
+  void OnDeleteAllEffects();
+  // Statuses of the list's own commands (the standard edit commands).
+  void OnDeleteStatus(CommandID command, CommandStatus& status) const;
+  void OnCopyStatus(CommandStatus& status) const;
+  void OnPasteStatus(CommandStatus& status) const;
+  void OnSelectAllStatus(CommandStatus& status) const;
+  void OnDeselectAllStatus(CommandStatus& status) const;
+  // The statuses of the effect commands the panel view routes to the list.
+  void OnCommandStatus(CommandID command, CommandStatus& status) const;
+  bool CanDeleteEffects() const;
+  bool GetAllowSavePreset() const;
+  // Copies of the selected effects and masks; null with an empty selection.
+  std::shared_ptr<const EffectClipboardItem> CreateVideoFilterComponentClipboardItemFromSelection()
+      const;
+  // Pastes the item's masks into the mask paste target as one step; false when there is no
+  // target or nothing to paste.
+  bool PasteFromVideoFilterComponentClipboardItem(const EffectClipboardItem& item);
+  // The effect a mask paste goes into: the first selected video effect that takes masks, or
+  // the owner of a selected mask. False when there is none.
+  bool GetMaskPasteTarget(ComponentRef& videoFilterComponent) const;
+  // The chains a paste of effects may go into (the shown items', or the master clip's).
+  std::vector<ComponentChainRef> GetPasteTargetChains() const;
 
   // --- Edit time ---
   // The edit line in sequence time (the timeline's); every parameter row reads it.
@@ -285,8 +413,17 @@ class EffectControlsListView : public SubView, public Listener {
 
   // --- State dump ---
   // Every row in display order (sections top to bottom, each row before its children) with
-  // its path of titles, class, geometry and state. Set-aside rows are listed too.
-  std::vector<StateDumpRow> GetDumpRows() const;
+  // its path of titles, class, geometry and state. Set-aside rows are listed too. `origin`:
+  // the list's top-left in the coordinates the rectangles are wanted in (the panel's).
+  std::vector<StateDumpRow> GetDumpRows(Point origin = {}) const;
+
+  // --- Mouse (list coordinates) ---
+  void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
+  void LeftButtonUpSelf(Point point, KeyModifiers modifiers) override;
+  void RightButtonDownSelf(Point point, KeyModifiers modifiers) override;
+  void MouseMoveSelf(Point point, KeyModifiers modifiers) override;
+  bool SetCursorSelf(Point point, KeyModifiers modifiers) override;
+  void MouseCaptureLostSelf() override;
 
   // --- Messages and commands ---
   void ListenToMessage(const Message& message) override;
@@ -338,7 +475,24 @@ class EffectControlsListView : public SubView, public Listener {
   int WalkLayout(LayoutSink* sink) const;
   void AfterLayoutChange();
   void ShowSectionRows(const EffectItemList& list, bool show);
+  // Selects the rows of the effects a paste added, once they are built; the request is for
+  // the next build only.
   void AutoSelectNthEmbeddedEffect();
+  // Selects the rows of these components alone; those without a row are skipped.
+  void SelectComponents(const std::vector<ComponentRef>& components);
+  // A press at `point` moved beyond the threshold: the effect pressed starts to move.
+  // Intrinsic, archived and read-only effects show the no-drop cursor and do not move.
+  void DragSelection(Point point);
+  bool HitTestRow(const std::shared_ptr<EffectItem>& row, Point point, KeyModifiers modifiers,
+                  MouseButton button);
+  bool IsMaskMultiSelectEnabled() const;
+  void OpenEditMenu(Point point);
+  // The sections that hold selectable rows, in display order (graphics, video, the audio
+  // parts of clips).
+  void ForEachSelectableList(const std::function<void(const EffectItemList&)>& visit) const;
+  std::shared_ptr<FilterItem> FindFilterRow(const Component* component,
+                                            const TrackItem* trackItem) const;
+  Project* GetTargetProject() const;
   // Every top row of every section, in display order.
   void ForEachTopRow(const std::function<void(const std::shared_ptr<EffectItem>&)>& visit) const;
   // What the style says about which rows exist.
@@ -400,6 +554,15 @@ class EffectControlsListView : public SubView, public Listener {
   int mVideoHeaderTop = -1;
   int mGraphicsHeaderTop = -1;
 
-  bool mPendingAutoSelect = false;
-  int mPendingAutoSelectIndex = -1;
+  // Effects a paste added, to select once the next build has made their rows.
+  std::vector<ComponentRef> mPendingSelection;
+
+  // Separator drag at the right edge and the click in progress.
+  bool mSeparatorEnabled = true;
+  bool mSeparatorHovering = false;
+  bool mSeparatorDragging = false;
+  int mSeparatorGrabOffset = 0;
+  std::optional<Point> mPressPoint;  // while a left click may still turn into a drag
+  // The audio part the dragged row belongs to (null: a video or graphics row). Not owned.
+  AudioPartInfo* mDragAudioPart = nullptr;
 };

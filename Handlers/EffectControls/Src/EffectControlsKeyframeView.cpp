@@ -23,6 +23,7 @@
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Decals.h"
 #include "Host/Toolkit/ImageList.h"
+#include "Host/Toolkit/StandardCommands.h"
 
 namespace {
 
@@ -160,6 +161,35 @@ int EffectControlsKeyframeView::GetSelectedKeyframeCount() const {
   return static_cast<int>(list->GetKeyframeSelection()->GetKeyframeCount());
 }
 
+bool EffectControlsKeyframeView::FindCommandStatus(CommandID command, CommandStatus& status) {
+  if (command == kCommandClear) {
+    status.enabled = GetSelectedKeyframeCount() > 0;
+    return true;
+  }
+  return SubView::FindCommandStatus(command, status);
+}
+
+bool EffectControlsKeyframeView::ObeyCommand(CommandID command) {
+  if (command == kCommandClear) {
+    DeleteSelectedKeyframes();
+    return true;
+  }
+  return SubView::ObeyCommand(command);
+}
+
+void EffectControlsKeyframeView::DeleteSelectedKeyframes() {
+  const auto list = mList.lock();
+  if (!list || !list->GetKeyframeSelection() || list->GetKeyframeSelection()->IsEmpty()) {
+    return;
+  }
+  // The selection is the list's and may be replaced by the rebuild an edit causes: keep it.
+  const std::shared_ptr<KeyframeMultiSelection> selection = list->GetKeyframeSelection();
+  if (selection->RemoveSelectionFromComponentParams() == EditStatus::Done) {
+    selection->Clear();
+    Invalidate();
+  }
+}
+
 void EffectControlsKeyframeView::PaintSelf(DC& dc) {
   const Rect bounds = GetLocalBounds();
   const Color background =
@@ -187,7 +217,6 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
     dc.FillRect(Rect{clipLeft, 0, clipRight, bounds.Height()}, background);
   }
 
-  const auto selection = list->GetKeyframeSelection();
   const auto draw = [&](const std::shared_ptr<EffectItem>& row) {
     if (!row->IsShown() || row->IsSetAside()) {
       return;
@@ -208,31 +237,15 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
     dc.FillRect(Rect{0, top + row->OwnHeight() - 1, bounds.Width(), top + row->OwnHeight()},
                 separator);
 
-    const auto* control = dynamic_cast<const ParameterControl*>(row.get());
-    if (control == nullptr || !control->GetParam() || !control->GetParam()->IsTimeVarying()) {
-      return;
-    }
-    const auto& keys = control->GetParam()->GetKeyframes().Keyframes();
-    const int centreY = top + row->OwnHeight() / 2;
-    for (std::size_t i = 0; i < keys.size(); ++i) {
-      const ClipTime clipTime(keys[i].time);
-      const TickTime sequenceTime = control->GetTrackItem()
-                                        ? control->ClipTimeToSequenceTime(clipTime).Ticks()
-                                        : list->ClipTimeToSequenceTime(clipTime).Ticks();
-      const int x = static_cast<int>(std::lround(TimeToX(sequenceTime)));
-      if (x < -8 || x > bounds.Width() + 8) {
-        continue;
-      }
-      const bool selected =
-          selection && selection->Contains(control->GetParam().get(), keys[i].time);
-      const int variant = (selected ? 3 : 0);
-      const int index = 6 * GlyphKind(keys[i].interpolation) + variant;
+    VisitGlyphs(*list, row, [&](const KeyframeGlyph& glyph) {
+      const int index = 6 * glyph.kind + (glyph.selected ? 3 : 0);
+      const Point at{glyph.centre.x - 7, glyph.centre.y - 8};
       if (mImages && index < mImages->GetCount()) {
-        mImages->Draw(dc, index, Point{x - 7, centreY - 8});
+        mImages->Draw(dc, index, at);
       } else {
-        dc.DrawBitmap(*Bitmap::GetBitmap(static_cast<Decal>(index)), Point{x - 7, centreY - 8});
+        dc.DrawBitmap(*Bitmap::GetBitmap(static_cast<Decal>(index)), at);
       }
-    }
+    });
   };
   VisitRows(list->GetVideoItems(), draw);
   VisitRows(list->GetGraphicsItems(), draw);
@@ -246,6 +259,59 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
     dc.FillRect(Rect{x, 0, x + 1, bounds.Height()},
                 ColorManager::GetColor(kColor_CurrentTimeIndicator));
   }
+}
+
+void EffectControlsKeyframeView::VisitGlyphs(
+    const EffectControlsListView& list, const std::shared_ptr<EffectItem>& row,
+    const std::function<void(const KeyframeGlyph&)>& visit) const {
+  const auto* control = dynamic_cast<const ParameterControl*>(row.get());
+  if (control == nullptr || !control->GetParam() || !control->GetParam()->IsTimeVarying()) {
+    return;
+  }
+  const int width = GetLocalBounds().Width();
+  const auto& selection = list.GetKeyframeSelection();
+  const auto& keys = control->GetParam()->GetKeyframes().Keyframes();
+  const int centreY = row->GetTop() + row->OwnHeight() / 2;
+  for (const auto& key : keys) {
+    const ClipTime clipTime(key.time);
+    const TickTime sequenceTime = control->GetTrackItem()
+                                      ? control->ClipTimeToSequenceTime(clipTime).Ticks()
+                                      : list.ClipTimeToSequenceTime(clipTime).Ticks();
+    const int x = static_cast<int>(std::lround(TimeToX(sequenceTime)));
+    if (x < -8 || x > width + 8) {
+      continue;
+    }
+    visit(KeyframeGlyph{
+        .row = control,
+        .clipTime = key.time,
+        .centre = Point{x, centreY},
+        .selected = selection && selection->Contains(control->GetParam().get(), key.time),
+        .kind = GlyphKind(key.interpolation),
+    });
+  }
+}
+
+std::vector<EffectControlsKeyframeView::KeyframeGlyph>
+EffectControlsKeyframeView::GetKeyframeGlyphs() const {
+  std::vector<KeyframeGlyph> glyphs;
+  const auto list = mList.lock();
+  if (!list || !mTimeline || !(GetSecondsPerPixel() > 0.0)) {
+    return glyphs;
+  }
+  const int height = GetLocalBounds().Height();
+  const auto collect = [&](const std::shared_ptr<EffectItem>& row) {
+    if (!row->IsShown() || row->IsSetAside() || row->GetTop() + row->Height() < 0 ||
+        row->GetTop() > height) {
+      return;
+    }
+    VisitGlyphs(*list, row, [&glyphs](const KeyframeGlyph& glyph) { glyphs.push_back(glyph); });
+  };
+  VisitRows(list->GetVideoItems(), collect);
+  VisitRows(list->GetGraphicsItems(), collect);
+  for (const auto& part : list->GetAudioParts()) {
+    VisitRows(part->GetItems(), collect);
+  }
+  return glyphs;
 }
 
 // --- Separator ---

@@ -1,16 +1,21 @@
 #pragma once
 
+#include <functional>
 #include <memory>
 #include <string_view>
+#include <vector>
 
 #include "Handlers/EffectControls/Src/ToolMode.h"
 #include "Host/Messaging/Listener.h"
 #include "Host/Messaging/Message.h"
 #include "Host/Model/ModelRefs.h"
 #include "Host/Time/TickTime.h"
+#include "Host/Toolkit/Geometry.h"
 #include "Host/Toolkit/SubView.h"
 
 class EffectControlsListView;
+class EffectItem;
+class ParameterControl;
 class ImageList;
 class PanelTimeline;
 
@@ -76,6 +81,18 @@ class EffectControlsKeyframeView : public SubView, public Listener {
   double TimeToX(TickTime time) const;
   TickTime XToTime(double x) const;
 
+  // One keyframe as the area draws it: the parameter's row, the keyframe's clip time, the
+  // glyph's centre (local coordinates), whether it is selected, and its glyph kind.
+  struct KeyframeGlyph {
+    const ParameterControl* row = nullptr;  // owned by the list; valid until its next rebuild
+    TickTime clipTime = 0;
+    Point centre;
+    bool selected = false;
+    int kind = 0;
+  };
+  // Every glyph drawn now (shown rows within the area), in row order then time order.
+  std::vector<KeyframeGlyph> GetKeyframeGlyphs() const;
+
   // Selected keyframes across the list's keyframe selection.
   int GetSelectedKeyframeCount() const;
 
@@ -84,6 +101,11 @@ class EffectControlsKeyframeView : public SubView, public Listener {
   // pointer in the list's coordinates (the panel view moves the split).
   static constexpr int kSeparatorGrabWidth = 4;
   bool IsDraggingSeparator() const { return mDraggingSeparator; }
+
+  // Delete (the standard clear command) removes the selected keyframes as one undo step.
+  bool FindCommandStatus(CommandID command, CommandStatus& status) override;
+  bool ObeyCommand(CommandID command) override;
+  void DeleteSelectedKeyframes();
 
   void PaintSelf(DC& dc) override;
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
@@ -96,6 +118,9 @@ class EffectControlsKeyframeView : public SubView, public Listener {
 
  private:
   void ReportSeparator(Point point) const;
+  // The glyphs of one row, placed as PaintSelf draws them.
+  void VisitGlyphs(const EffectControlsListView& list, const std::shared_ptr<EffectItem>& row,
+                   const std::function<void(const KeyframeGlyph&)>& visit) const;
 
   std::weak_ptr<EffectControlsListView> mList;
   std::shared_ptr<const PanelTimeline> mTimeline;

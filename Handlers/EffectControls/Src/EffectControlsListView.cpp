@@ -1,8 +1,15 @@
-// Construction, listening, commands, selection, the shared time state and the state dump of
-// the effect list. Building, layout and painting live in the files named after them.
+// Construction, listening, command dispatch, the shared time state and the state dump of the
+// effect list. Building, layout, painting, selection and the effect commands live in the files
+// named after them.
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 
+#include <cxxabi.h>
+
 #include <algorithm>
+#include <cstdlib>
+#include <memory>
+#include <string>
+#include <typeinfo>
 #include <utility>
 
 #include "Handlers/EffectControls/Src/AudioPartInfo.h"
@@ -12,6 +19,7 @@
 #include "Handlers/EffectControls/Src/ParameterRowFactory.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ComponentChainActions.h"
+#include "Host/Model/DirectManipulationManager.h"
 #include "Host/Model/EditPermissions.h"
 #include "Host/Model/KeyframeMultiSelection.h"
 #include "Host/Model/MasterClip.h"
@@ -23,6 +31,7 @@
 #include "Host/Shell/ShellMessages.h"
 #include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/MultiPictureButton.h"
+#include "Host/Toolkit/StandardCommands.h"
 
 namespace {
 
@@ -52,8 +61,21 @@ bool IsValidLinkedTrackItems(const std::vector<TrackItemGroup>& groups) {
          video->GetLinkGroup() == audio->GetLinkGroup();
 }
 
+// "PictureButton" for a PictureButton; the mangled name when it cannot be read.
+std::string ClassNameOf(const ViewBase& view) {
+  const char* mangled = typeid(view).name();
+  int status = 0;
+  std::unique_ptr<char, void (*)(void*)> readable(
+      abi::__cxa_demangle(mangled, nullptr, nullptr, &status), std::free);
+  return status == 0 && readable ? std::string(readable.get()) : std::string(mangled);
+}
+
+StateDumpRect Offset(const Rect& rect, Point origin) {
+  return {rect.left + origin.x, rect.top + origin.y, rect.Width(), rect.Height()};
+}
+
 void AppendDumpRows(const std::shared_ptr<EffectItem>& row, std::vector<std::string> path,
-                    std::vector<StateDumpRow>& rows) {
+                    Point origin, std::vector<StateDumpRow>& rows) {
   path.push_back(row->GetName());
   StateDumpRow dump;
   dump.path = path;
@@ -65,9 +87,18 @@ void AppendDumpRows(const std::shared_ptr<EffectItem>& row, std::vector<std::str
   dump.selected = row->IsSelected();
   dump.setAside = row->IsSetAside();
   dump.shown = row->IsShown();
+  if (row->IsShown() && !row->IsSetAside()) {
+    dump.rect = Offset(Rect::FromSize(0, row->GetTop(), row->GetWidth(), row->OwnHeight()), origin);
+  }
+  for (const auto& control : row->GetControls()) {
+    dump.controls.push_back({.className = ClassNameOf(*control),
+                             .rect = Offset(control->GetBounds(), origin),
+                             .visible = control->IsVisible(),
+                             .enabled = control->IsEnabled()});
+  }
   rows.push_back(std::move(dump));
   for (const auto& child : row->GetItems()) {
-    AppendDumpRows(child, path, rows);
+    AppendDumpRows(child, path, origin, rows);
   }
 }
 
@@ -85,7 +116,7 @@ EffectControlsListView::EffectControlsListView(Commander* parent, StationName ow
   for (const StationName& station :
        {mOwnStation, StationName(kSequenceActivationStation),
         StationName(kVideoFilterNotifierStation), StationName(kTextControlResizeStation),
-        mTimeline->GetStation()}) {
+        StationName(kDirectManipulationStation), mTimeline->GetStation()}) {
     AddListener(station, *this);
   }
 }
@@ -208,78 +239,6 @@ bool EffectControlsListView::AllowsViewMode(int /*viewMode*/) const {
   return true;
 }
 
-// --- Selections ---
-
-void EffectControlsListView::SelectItem(const std::shared_ptr<EffectItem>& row, bool select) {
-  auto* filter = dynamic_cast<FilterItem*>(row.get());
-  if (filter == nullptr) {
-    return;
-  }
-  const ComponentRef& component = filter->Component();
-  const TrackItemRef& trackItem = filter->GetTrackItem();
-  const bool found = mSelectedFilters.Contains(component.get(), trackItem.get());
-  if (select && !found) {
-    mSelectedFilters.Add(component, trackItem);
-  } else if (!select && found) {
-    mSelectedFilters.Remove(component.get(), trackItem.get());
-  }
-  filter->SetSelected(select);
-}
-
-void EffectControlsListView::SelectParameter(const std::shared_ptr<EffectItem>& row, bool select) {
-  auto* parameter = dynamic_cast<ParameterControl*>(row.get());
-  if (parameter == nullptr || !parameter->GetParam()) {
-    return;
-  }
-  const ComponentParamRef& param = parameter->GetParam();
-  const bool found = mSelectedParameters.Contains(param.get());
-  if (select && !found) {
-    mSelectedParameters.Add(parameter->GetComponent(), param, parameter->GetTrackItem());
-  } else if (!select && found) {
-    mSelectedParameters.Remove(param.get());
-  }
-  parameter->SetSelected(select);
-}
-
-void EffectControlsListView::ClearSelection() {
-  if (mSelectedFilters.IsEmpty() && mSelectedParameters.IsEmpty()) {
-    Invalidate();
-    return;
-  }
-  mSelectedFilters.Clear();
-  mSelectedParameters.Clear();
-  auto clearFlags = [](const EffectItemList& list) {
-    list.ForEachRow([](const EffectItemList::Row& row) {
-      row->SetSelected(false);
-      return true;
-    });
-  };
-  clearFlags(mVideoItems);
-  clearFlags(mGraphicsItems);
-  for (const auto& part : mAudioParts) {
-    if (part->IsClipPart()) {
-      clearFlags(part->GetItems());
-    }
-  }
-  BroadcastMessage(mOwnStation, EffectControlsFilterSelectionChangedMessage());
-  Invalidate();
-}
-
-void EffectControlsListView::AutoSelectNthEmbeddedEffect() {
-  if (!mPendingAutoSelect) {
-    return;
-  }
-  mPendingAutoSelect = false;
-  const EffectItemList& list = mVideoItems.IsEmpty() ? mGraphicsItems : mVideoItems;
-  if (mPendingAutoSelectIndex < 0 ||
-      static_cast<std::size_t>(mPendingAutoSelectIndex) >= list.Size()) {
-    return;
-  }
-  ClearSelection();
-  SelectItem(list[static_cast<std::size_t>(mPendingAutoSelectIndex)], true);
-  Invalidate();
-}
-
 // --- Messages and commands ---
 
 void EffectControlsListView::ListenToMessage(const Message& message) {
@@ -294,18 +253,14 @@ void EffectControlsListView::ListenToMessage(const Message& message) {
   } else if (const auto* onOff = message.As<FilterOnOffAllChanged>()) {
     OnFilterOnOffAllChanged(onOff->enabled);
   } else if (const auto* added = message.As<EmbeddedEffectAdded>()) {
-    // Remember where the pasted effect will be once the list is rebuilt.
-    const EffectItemList& list = mVideoItems.IsEmpty() ? mGraphicsItems : mVideoItems;
-    int index = 0;
-    for (const auto& row : list) {
-      if (const auto* filter = dynamic_cast<const FilterItem*>(row.get());
-          filter != nullptr && filter->Component() == added->component) {
-        mPendingAutoSelectIndex = index;
-        mPendingAutoSelect = true;
-        break;
-      }
-      ++index;
+    // The rebuild the insertion causes may come before or after this message: select the
+    // effect now if it has a row, and again after the next build (that one only).
+    if (FindFilterRow(added->component.get(), nullptr)) {
+      SelectComponents({added->component});
     }
+    mPendingSelection = {added->component};
+  } else if (const auto* picked = message.As<DirectManipulationFilterPickedMessage>()) {
+    SelectDMFilterItem(picked->component);
   } else if (message.Is<ParameterControlChangedMessage>()) {
     BroadcastRefreshKeyframes();
     if (mVideoLimiterPresent) {
@@ -373,6 +328,38 @@ bool EffectControlsListView::FindCommandStatus(CommandID command, CommandStatus&
     status.enabled = CanPlayAudioPart(command - kPlayAudioPartCommand);
     return true;
   }
+  switch (command) {
+    case kCommandClear:
+    case kCommandPaste:
+      // With nothing of the list's to act on, the answer is left to the keyframe area.
+      if (command == kCommandClear) {
+        OnDeleteStatus(command, status);
+      } else {
+        OnPasteStatus(status);
+      }
+      return status.enabled;
+    case kCommandCut:
+      OnDeleteStatus(command, status);
+      return true;
+    case kCommandCopy:
+      OnCopyStatus(status);
+      return true;
+    case kCommandSelectAll:
+      OnSelectAllStatus(status);
+      return true;
+    case kCommandDeselectAll:
+      OnDeselectAllStatus(status);
+      return true;
+    case kDeleteEffectCommand:
+    case kDeleteAllEffectsCommand:
+    case kEffectsEnabledCommand:
+    case kResetEffectCommand:
+    case kSavePresetCommand:
+      OnCommandStatus(command, status);
+      return true;
+    default:
+      break;
+  }
   return SubView::FindCommandStatus(command, status);
 }
 
@@ -392,6 +379,36 @@ bool EffectControlsListView::ObeyCommand(CommandID command) {
   if (command >= kAudioExpanderCommand && command < kAudioExpanderCommand + kMaxAudioParts) {
     OnAudioExpander(command);
     return true;
+  }
+  switch (command) {
+    // Delete and paste answer "not handled" when there was nothing to act on, so that the
+    // panel offers them to the keyframe area.
+    case kCommandClear:
+    case kDeleteEffectCommand:
+      return OnDelete();
+    case kCommandPaste:
+      return OnPaste();
+    case kCommandCut:
+      return OnCut();
+    case kCommandCopy:
+      return OnCopy();
+    case kCommandSelectAll:
+      OnSelectAll();
+      return true;
+    case kCommandDeselectAll:
+      OnDeselectAll();
+      return true;
+    case kDeleteAllEffectsCommand:
+      OnDeleteAllEffects();
+      return true;
+    case kEffectsEnabledCommand:
+      OnEffectEnabled();
+      return true;
+    case kResetEffectCommand:
+      OnResetEffect();
+      return true;
+    default:
+      break;
   }
   return SubView::ObeyCommand(command);
 }
@@ -453,11 +470,11 @@ void EffectControlsListView::OnTimelineChanged(const PanelTimelineChangedMessage
 
 // --- State dump ---
 
-std::vector<StateDumpRow> EffectControlsListView::GetDumpRows() const {
+std::vector<StateDumpRow> EffectControlsListView::GetDumpRows(Point origin) const {
   std::vector<StateDumpRow> rows;
-  auto dumpList = [&rows](const EffectItemList& list) {
+  auto dumpList = [&rows, origin](const EffectItemList& list) {
     for (const auto& row : list) {
-      AppendDumpRows(row, {}, rows);
+      AppendDumpRows(row, {}, origin, rows);
     }
   };
   dumpList(mGraphicsItems);

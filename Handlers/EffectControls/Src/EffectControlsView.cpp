@@ -5,13 +5,21 @@
 #include <utility>
 
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
+#include "Handlers/EffectControls/Src/AudioPartInfo.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
 #include "Handlers/EffectControls/Src/EffectControlsListHeader.h"
 #include "Handlers/EffectControls/Src/PanelTimeline.h"
 #include "Host/Messaging/Localization.h"
 #include "Host/Messaging/Preferences.h"
 #include "Host/Messaging/PropertyList.h"
+#include "Host/Model/Component.h"
+#include "Host/Model/ComponentParam.h"
+#include "Host/Model/DirectManipulationManager.h"
+#include "Host/Model/KeyframeMultiSelection.h"
+#include "Host/Model/KeyframeSelection.h"
 #include "Host/Model/Sequence.h"
+#include "Host/Rows/EffectItem.h"
+#include "Host/Rows/ParameterControl.h"
 #include "Host/Shell/ShellMessages.h"
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/DC.h"
@@ -387,14 +395,80 @@ void EffectControlsView::DestroySelf() {
 
 // --- Dump ---
 
+namespace {
+
+std::vector<std::string> RowPath(const EffectItem& row) {
+  std::vector<std::string> path{row.GetName()};
+  for (auto parent = row.GetParentItem(); parent; parent = parent->GetParentItem()) {
+    path.insert(path.begin(), parent->GetName());
+  }
+  return path;
+}
+
+// The row showing `param`, or null.
+const ParameterControl* FindParameterRow(const EffectControlsListView& list,
+                                         const ComponentParam* param) {
+  const ParameterControl* found = nullptr;
+  auto look = [&](const EffectItemList& rows) {
+    rows.ForEachRow([&](const EffectItemList::Row& row) {
+      const auto* control = dynamic_cast<const ParameterControl*>(row.get());
+      if (control != nullptr && control->GetParam().get() == param) {
+        found = control;
+        return false;
+      }
+      return true;
+    });
+  };
+  look(list.GetVideoItems());
+  look(list.GetGraphicsItems());
+  for (const auto& part : list.GetAudioParts()) {
+    look(part->GetItems());
+  }
+  return found;
+}
+
+const char* ToolModeName(ToolMode mode) {
+  switch (mode) {
+    case ToolMode::kZoom:
+      return "zoom";
+    case ToolMode::kHand:
+      return "hand";
+    case ToolMode::kPen:
+      return "pen";
+    case ToolMode::kPointer:
+      break;
+  }
+  return "pointer";
+}
+
+}  // namespace
+
 void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.headerText = mHeader->GetDisplayText();
   dump.targetMode = mTargetMode;
-  dump.rows = mListView->GetDumpRows();
+  dump.rows = mListView->GetDumpRows(mListView->GetBounds().TopLeft());
   if (mKeyframesVisible) {
     StateDumpKeyframeArea area;
     area.visibleStartTime = mTimeline->GetVisibleStart();
     area.secondsPerPixel = mTimeline->GetSecondsPerPixel();
+    if (const auto& selection = mListView->GetKeyframeSelection()) {
+      for (const KeyframeSelection& keys : selection->GetAllSelections()) {
+        const ParameterControl* row = FindParameterRow(*mListView, keys.GetParam().get());
+        for (const TickTime time : keys.GetKeyframeTimes()) {
+          area.selectedKeyframes.push_back(
+              {.path = row ? RowPath(*row) : std::vector<std::string>{keys.GetParam()->GetName()},
+               .time = time});
+        }
+      }
+    }
+    const Point origin = mKeyframeView->GetBounds().TopLeft();
+    for (const auto& glyph : mKeyframeView->GetKeyframeGlyphs()) {
+      area.glyphs.push_back({.path = RowPath(*glyph.row),
+                             .time = glyph.clipTime,
+                             .x = glyph.centre.x + origin.x,
+                             .y = glyph.centre.y + origin.y,
+                             .selected = glyph.selected});
+    }
     dump.keyframeArea = area;
   }
   dump.extra.emplace_back("selectedKeyframeCount",
@@ -413,4 +487,10 @@ void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.extra.emplace_back("listLeft", static_cast<std::int64_t>(list.left));
   dump.extra.emplace_back("listTop", static_cast<std::int64_t>(list.top));
   dump.extra.emplace_back("listWidth", static_cast<std::int64_t>(list.Width()));
+  dump.extra.emplace_back("toolMode", std::string(ToolModeName(mToolMode)));
+  const DirectManipulationManager* manager = mListView->GetDirectManipulationManager();
+  const ComponentRef onScreen =
+      manager != nullptr && manager->AreControlsShown() ? manager->GetFilter() : nullptr;
+  dump.extra.emplace_back("directManipulation",
+                          onScreen ? onScreen->GetDisplayName() : std::string());
 }

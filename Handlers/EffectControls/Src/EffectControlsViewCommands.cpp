@@ -253,13 +253,13 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
     case kDeleteEffectCommand:
     case kResetEffectCommand:
     case kDeleteAllEffectsCommand:
-    case kCommandClear:
-      // The list answers for its effect commands; they stay off until it does.
+      // The list answers for its effect commands.
       if (!mListView->FindCommandStatus(command, status)) {
         status = CommandStatus{};
       }
       status.enabled = status.enabled && editable;
       return true;
+    case kCommandClear:
     case kCommandPaste:
       if (!mListView->FindCommandStatus(command, status) || !status.enabled) {
         status = CommandStatus{};
@@ -367,11 +367,10 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
     case kDeleteEffectCommand:
     case kResetEffectCommand:
     case kDeleteAllEffectsCommand:
-      // Effect commands are the list's (its effect commands are not built yet).
       mListView->ObeyCommand(command);
       return true;
     case kCommandClear:
-      // Selected effects first, else selected keyframes (neither is built yet).
+      // Selected effects first, else selected keyframes.
       if (!mListView->ObeyCommand(command)) {
         mKeyframeView->ObeyCommand(command);
       }

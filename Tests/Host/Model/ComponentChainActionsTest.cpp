@@ -198,4 +198,25 @@ TEST_F(ComponentChainActionsTest, MasksAreAddedAndRemovedAsEmbeddedComponents) {
             EditStatus::InvalidArgument);  // crop takes no masks
 }
 
+// Regression: the masks an effect keeps were taken for masks of another chain, so a second mask
+// could not be added to an effect in a chain, nor one of two removed.
+TEST_F(ComponentChainActionsTest, AnEffectInAChainTakesASecondMaskAndGivesUpOneOfTwo) {
+  const ComponentRef opacity = Intrinsic(kMatchName_Opacity);
+  const ComponentRef first = Catalogue().Create(kMatchName_Mask);
+  const ComponentRef other = Catalogue().Create(kMatchName_Mask);
+  ASSERT_EQ(ComponentActions::AddMask(opacity, first), EditStatus::Done);
+  ASSERT_EQ(ComponentActions::AddMask(opacity, other), EditStatus::Done);
+  EXPECT_EQ(opacity->GetMasks(), (std::vector<ComponentRef>{first, other}));
+  ASSERT_EQ(ComponentActions::RemoveMask(opacity, first), EditStatus::Done);
+  EXPECT_EQ(opacity->GetMasks(), std::vector<ComponentRef>{other});
+  EXPECT_EQ(first->GetMaskOwner(), nullptr);
+  ASSERT_TRUE(Undo().Undo());
+  EXPECT_EQ(opacity->GetMasks(), (std::vector<ComponentRef>{first, other}));
+  // A mask of another effect is still refused.
+  const ComponentRef blurMask = Catalogue().Create(kMatchName_Mask);
+  ASSERT_EQ(ComponentActions::AddMask(blur, blurMask), EditStatus::Done);
+  EXPECT_NE(ComponentActions::AddMask(opacity, blurMask), EditStatus::Done);
+  EXPECT_EQ(blurMask->GetMaskOwner(), blur.get());
+}
+
 }  // namespace

@@ -89,6 +89,42 @@ TEST(AutomationScript, ErrorsNameTheLineAndTheFault) {
   EXPECT_EQ(Error(AutomationScript::Parse("click 99999999999 1")).line, 1);
 }
 
+TEST(AutomationScript, WaitCloseAndMemoryTakeTheirArgumentsOrRefuseThem) {
+  const auto parsed = AutomationScript::Parse("wait 250\nclose\nmemory m.json\n");
+  ASSERT_TRUE(std::holds_alternative<AutomationScript>(parsed));
+  const auto& commands = std::get<AutomationScript>(parsed).Commands();
+  ASSERT_EQ(commands.size(), 3u);
+  EXPECT_EQ(commands[0].verb, ScriptVerb::kWait);
+  EXPECT_EQ(commands[0].numbers, std::vector<int>{250});
+  EXPECT_EQ(commands[1].verb, ScriptVerb::kClose);
+  EXPECT_EQ(commands[2].text, "m.json");
+  EXPECT_EQ(Error(AutomationScript::Parse("wait 60001")).message, "wait needs MS from 0 to 60000");
+  EXPECT_EQ(Error(AutomationScript::Parse("wait -1")).message, "wait needs MS from 0 to 60000");
+  EXPECT_EQ(Error(AutomationScript::Parse("wait")).message, "wait needs MS");
+  EXPECT_EQ(Error(AutomationScript::Parse("close now")).message, "close takes no arguments");
+}
+
+TEST(AutomationScript, ParsesWhatAUserDoesOutsideThePanel) {
+  const auto parsed = AutomationScript::Parse("tool rate-stretch\nopen 21 43\nreopen-panel\n");
+  ASSERT_TRUE(std::holds_alternative<AutomationScript>(parsed));
+  const auto& commands = std::get<AutomationScript>(parsed).Commands();
+  ASSERT_EQ(commands.size(), 3u);
+  EXPECT_EQ(commands[0].verb, ScriptVerb::kTool);
+  EXPECT_EQ(commands[0].text, "rate-stretch");
+  EXPECT_EQ(commands[1].verb, ScriptVerb::kOpen);
+  EXPECT_EQ(commands[1].ids, (std::vector<std::int64_t>{21, 43}));
+  EXPECT_EQ(commands[2].verb, ScriptVerb::kReopenPanel);
+
+  EXPECT_EQ(
+      Error(AutomationScript::Parse("tool chisel")).message.rfind("'chisel' is not a tool (", 0),
+      0u);
+  EXPECT_EQ(Error(AutomationScript::Parse("tool")).message, "tool needs one tool name");
+  EXPECT_EQ(Error(AutomationScript::Parse("open")).message,
+            "open needs at least one track-item id");
+  EXPECT_EQ(Error(AutomationScript::Parse("reopen-panel now")).message,
+            "reopen-panel takes no arguments");
+}
+
 TEST(AutomationScript, AMissingFileIsAnErrorNotACrash) {
   const auto error = Error(AutomationScript::ParseFile("/nonexistent/script.txt"));
   EXPECT_EQ(error.line, 0);

@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "Host/Messaging/Diagnostics.h"
+#include "Host/Messaging/FunctionListener.h"
 #include "Host/Messaging/MessagingTestScope.h"
 #include "Host/Model/FunctionAction.h"
 #include "Host/Model/Project.h"
@@ -19,10 +20,12 @@
 #include "Host/Shell/DemoProject.h"
 #include "Host/Shell/Handler.h"
 #include "Host/Shell/ScriptRunner.h"
+#include "Host/Shell/ShellMessages.h"
 #include "Host/Shell/StateDumpSource.h"
 #include "Host/Shell/ViewHostInputRoute.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/CommandContext.h"
+#include "Host/Toolkit/Cursor.h"
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Image.h"
 #include "Host/Toolkit/InputBox.h"
@@ -133,6 +136,8 @@ class ScriptPanel : public TabView, public StateDumpSource {
     row.height = 18;
     row.groupLevel = 1;
     row.shown = true;
+    row.rect = StateDumpRect{5, 40, 200, 18};
+    row.controls.push_back({"PictureButton", {180, 41, 16, 16}, true, false});
     dump.rows.push_back(row);
     StateDumpKeyframeArea area;
     area.visibleStartTime = 0;
@@ -410,6 +415,51 @@ TEST_F(ScriptRunnerTest, DumpIsJSONWithHistoryAssertionsAndPanelState) {
   EXPECT_EQ(panel["rows"][0]["class"], "FloatSliderParameter");
   EXPECT_EQ(panel["keyframeArea"]["selectedKeyframes"][0]["time"], 254016000000);
   EXPECT_EQ(panel["extra"]["answer"], 42);
+  EXPECT_EQ(panel["rows"][0]["rect"],
+            nlohmann::json::parse(R"({"x": 5, "y": 40, "width": 200, "height": 18})"));
+  EXPECT_EQ(panel["rows"][0]["controls"][0]["class"], "PictureButton");
+  EXPECT_EQ(panel["rows"][0]["controls"][0]["rect"]["x"], 180);
+  EXPECT_EQ(panel["rows"][0]["controls"][0]["enabled"], false);
+  EXPECT_EQ(dump["workspace"]["cursor"], "kOSArrow");
+}
+
+TEST_F(ScriptRunnerTest, AToolPickedInAScriptReachesTheToolStation) {
+  std::vector<std::string> heard;
+  FunctionListener listener(
+      [&heard](const Message& message) { heard.push_back(std::string(message.GetTypeName())); });
+  AddListener(kToolStation, listener);
+  const auto result = RunText("tool pen\ntool pointer\n");
+  ASSERT_TRUE(result.ok) << result.Describe();
+  EXPECT_EQ(heard,
+            (std::vector<std::string>{"PenToolSelectedMessage", "PointerToolSelectedMessage"}));
+  EXPECT_EQ(mApp->GetTool(), HostTool::kPointer);
+}
+
+TEST_F(ScriptRunnerTest, OpenSelectsTheItemsAndAnnouncesThemOpened) {
+  std::vector<ObjectID> opened;
+  FunctionListener listener([&opened](const Message& message) {
+    if (const auto* open = message.As<TrackItemSelectionOpenedMessage>()) {
+      for (const auto& item : open->items)
+        opened.push_back(item->GetID());
+    }
+  });
+  AddListener(kTrackItemActivationStation, listener);
+  const auto result = RunText("open 101\n");
+  ASSERT_TRUE(result.ok) << result.Describe();
+  EXPECT_EQ(opened, std::vector<ObjectID>{101});
+  ASSERT_EQ(mApp->GetActiveSequence()->GetSelection().size(), 1u);
+
+  const auto missing = RunText("open 987654321\n");
+  EXPECT_FALSE(missing.ok);
+  EXPECT_EQ(opened.size(), 1u);
+}
+
+TEST_F(ScriptRunnerTest, ReopenPanelGivesTheTabANewView) {
+  const ScriptPanel* before = &Panel();
+  const auto result = RunText("reopen-panel\n");
+  ASSERT_TRUE(result.ok) << result.Describe();
+  EXPECT_NE(&Panel(), before);
+  EXPECT_EQ(mApp->GetWorkspaceFrame().GetFrontTab()->GetHandlerID(), kHandlerID);
 }
 
 TEST_F(ScriptRunnerTest, SaveIsRefusedAndNothingIsWritten) {
