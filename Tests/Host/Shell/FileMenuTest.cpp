@@ -1,5 +1,6 @@
 // The program's File menu and its commands: open another project, save, quit.
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 #include <filesystem>
 #include <memory>
@@ -64,7 +65,10 @@ class FileMenuTest : public ::testing::Test {
   }
 
   MessagingTestScope messaging;
-  const std::string folder = (std::filesystem::temp_directory_path() / "FileMenuTest").string();
+  // One folder a process: ctest runs the cases of this file side by side.
+  const std::string folder =
+      (std::filesystem::temp_directory_path() / ("FileMenuTest-" + std::to_string(::getpid())))
+          .string();
   const std::string firstFile = folder + "/first.json";
   const std::string otherFile = folder + "/other.json";
   Application application;

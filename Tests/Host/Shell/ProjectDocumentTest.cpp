@@ -1,4 +1,5 @@
 #include <gtest/gtest.h>
+#include <unistd.h>
 
 #include <filesystem>
 #include <memory>
@@ -30,6 +31,7 @@ class ProjectDocumentTest : public ::testing::Test {
   ~ProjectDocumentTest() override {
     SetMenuTrackerForTesting(previousMenus);
     InputBox::SetResponder(previousBoxes);
+    std::filesystem::remove_all(folder);
   }
 
   // One undoable change of the project: its name.
@@ -50,8 +52,10 @@ class ProjectDocumentTest : public ::testing::Test {
   }
 
   MessagingTestScope messaging;
-  const std::string folder =
-      (std::filesystem::temp_directory_path() / "ProjectDocumentTest").string();
+  // One folder a process: ctest runs the cases of this file side by side.
+  const std::string folder = (std::filesystem::temp_directory_path() /
+                              ("ProjectDocumentTest-" + std::to_string(::getpid())))
+                                 .string();
   const std::string file = folder + "/project.json";
   ProjectRef project = Project::Create("First");
   std::shared_ptr<ScriptedMenuTracker> menus = std::make_shared<ScriptedMenuTracker>();
