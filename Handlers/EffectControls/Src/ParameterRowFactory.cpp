@@ -10,6 +10,8 @@
 #include "Handlers/EffectControls/Src/AudioFloatSliderParameter.h"
 #include "Handlers/EffectControls/Src/ButtonParameter.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Handlers/EffectControls/Src/GroupCurveBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupRGBCurvesBeginParameter.h"
 #include "Handlers/EffectControls/Src/OpaqueParameter.h"
 #include "Handlers/EffectControls/Src/PointSliderParameter.h"
 #include "Handlers/EffectControls/Src/TimecodeParameter.h"
@@ -232,13 +234,13 @@ std::shared_ptr<GroupBeginParameter> ParameterRowFactory::CreateGroupRow(
     case GroupKind::Levels:
       return GroupStandIn("GroupLevelsBeginParameter", info);
     case GroupKind::RGBCurves:
-      return GroupStandIn("GroupRGBCurvesBeginParameter", info);
+      return std::make_shared<GroupRGBCurvesBeginParameter>(info);
     case GroupKind::Buttons:
       return GroupStandIn(request.componentIsMask ? "GroupTrackerButtonsBeginParameter"
                                                   : "GroupButtonsBeginParameter",
                           info);
     case GroupKind::Curve:
-      return GroupStandIn("GroupCurveBeginParameter", info);
+      return std::make_shared<GroupCurveBeginParameter>(info);
     case GroupKind::ColorPickerRange:
       return GroupStandIn("GroupColorPickerRangeBeginParameter", info);
     case GroupKind::HueRangeDefinition:
