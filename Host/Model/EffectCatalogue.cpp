@@ -305,12 +305,44 @@ ComponentRef RGBCurves() {
   return effect;
 }
 
+// A colour wheel's two parameters: the hue angle in degrees and the balance magnitude.
+void AddWheel(const ComponentRef& effect, const std::string& wheel) {
+  effect->AddParam(Scalar((wheel + " Angle").c_str(), 0.0, -1.0e6, 1.0e6, 1, ParamUnits::Degrees,
+                          ParamType::Angle));
+  effect->AddParam(Scalar((wheel + " Magnitude").c_str(), 0.0, 0.0, 100.0, 1, ParamUnits::None,
+                          ParamType::DoubleSlider));
+}
+
+ComponentRef ColorBalanceWheel() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_ColorBalanceWheel, "Color Balance Wheel", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Group("Balance", GroupKind::HueBalanceAndPhase));
+  AddWheel(effect, "Balance");
+  effect->AddParam(GroupEnd());
+  effect->AddParam(Scalar("Saturation", 100.0, 0.0, 200.0, 1, ParamUnits::Percent));
+  return effect;
+}
+
+ComponentRef ThreeWayColor() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_ThreeWayColor, "Three-Way Color", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Group("Tonal Balance", GroupKind::ThreeWayHueBalance));
+  for (const char* wheel : {"Shadows", "Midtones", "Highlights"}) {
+    AddWheel(effect, wheel);
+  }
+  effect->AddParam(Check("Link Wheels", false));
+  effect->AddParam(GroupEnd());
+  return effect;
+}
+
 EffectCatalogue MakeStandard() {
   EffectCatalogue catalogue;
   for (ComponentRef effect :
        {Motion(), Opacity(), TimeRemapping(), Volume(), ChannelVolume(), Panner(), GaussianBlur(),
         BrightnessContrast(), Crop(), Tint(), Timecode(), GridDistortion(), Delay(), Mask(),
-        MatteFromTrack(), LumaCurve(), RGBCurves()}) {
+        MatteFromTrack(), LumaCurve(), RGBCurves(), ColorBalanceWheel(), ThreeWayColor()}) {
     catalogue.Register(std::move(effect));
   }
   DescribeAudioParams(catalogue);

@@ -11,7 +11,9 @@
 #include "Handlers/EffectControls/Src/ButtonParameter.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Handlers/EffectControls/Src/GroupCurveBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupHueBalanceAndPhaseBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupRGBCurvesBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupThreeWayHueBalanceBeginParameter.h"
 #include "Handlers/EffectControls/Src/OpaqueParameter.h"
 #include "Handlers/EffectControls/Src/PointSliderParameter.h"
 #include "Handlers/EffectControls/Src/TimecodeParameter.h"
@@ -226,9 +228,9 @@ std::shared_ptr<GroupBeginParameter> ParameterRowFactory::CreateGroupRow(
   }
   switch (info.param->GetGroupKind()) {
     case GroupKind::HueBalanceAndPhase:
-      return GroupStandIn("GroupHueBalanceAndPhaseBeginParameter", info);
+      return std::make_shared<GroupHueBalanceAndPhaseBeginParameter>(info);
     case GroupKind::ThreeWayHueBalance:
-      return GroupStandIn("GroupThreeWayHueBalanceBeginParameter", info);
+      return std::make_shared<GroupThreeWayHueBalanceBeginParameter>(info);
     case GroupKind::TonalRangeDefinition:
       return GroupStandIn("GroupTonalRangeDefinitionBeginParameter", info);
     case GroupKind::Levels:
