@@ -337,12 +337,36 @@ ComponentRef ThreeWayColor() {
   return effect;
 }
 
+// A hue range with soft edges; the end softness is measured down from 360.
+ComponentRef HueRange() {
+  ComponentRef effect = MakeEffect(kMatchName_HueRange, "Hue Range", MediaType::Video, false);
+  effect->AddParam(Group("Hue Range", GroupKind::HueRangeDefinition));
+  effect->AddParam(Check("Show Range", false));
+  effect->AddParam(
+      Scalar("Start Threshold", 60.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(
+      Scalar("Start Softness", 30.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(
+      Scalar("End Threshold", 180.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(
+      Scalar("End Softness", 150.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(GroupEnd());
+  effect->AddParam(Scalar("Desaturate Outside", 0.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  return effect;
+}
+
 EffectCatalogue MakeStandard() {
   EffectCatalogue catalogue;
-  for (ComponentRef effect :
-       {Motion(), Opacity(), TimeRemapping(), Volume(), ChannelVolume(), Panner(), GaussianBlur(),
-        BrightnessContrast(), Crop(), Tint(), Timecode(), GridDistortion(), Delay(), Mask(),
-        MatteFromTrack(), LumaCurve(), RGBCurves(), ColorBalanceWheel(), ThreeWayColor()}) {
+  for (ComponentRef effect : {Motion(),         Opacity(),
+                              TimeRemapping(),  Volume(),
+                              ChannelVolume(),  Panner(),
+                              GaussianBlur(),   BrightnessContrast(),
+                              Crop(),           Tint(),
+                              Timecode(),       GridDistortion(),
+                              Delay(),          Mask(),
+                              MatteFromTrack(), LumaCurve(),
+                              RGBCurves(),      ColorBalanceWheel(),
+                              ThreeWayColor(),  HueRange()}) {
     catalogue.Register(std::move(effect));
   }
   DescribeAudioParams(catalogue);

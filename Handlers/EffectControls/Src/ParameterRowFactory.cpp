@@ -12,6 +12,7 @@
 #include "Handlers/EffectControls/Src/FilterItem.h"
 #include "Handlers/EffectControls/Src/GroupCurveBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupHueBalanceAndPhaseBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupHueRangeDefinitionBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupRGBCurvesBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupThreeWayHueBalanceBeginParameter.h"
 #include "Handlers/EffectControls/Src/OpaqueParameter.h"
@@ -246,7 +247,7 @@ std::shared_ptr<GroupBeginParameter> ParameterRowFactory::CreateGroupRow(
     case GroupKind::ColorPickerRange:
       return GroupStandIn("GroupColorPickerRangeBeginParameter", info);
     case GroupKind::HueRangeDefinition:
-      return GroupStandIn("GroupHueRangeDefinitionBeginParameter", info);
+      return std::make_shared<GroupHueRangeDefinitionBeginParameter>(info);
     case GroupKind::SaturationRangeDefinition:
       return GroupStandIn("GroupSaturationRangeDefinitionBeginParameter", info);
     case GroupKind::LumaRangeDefinition:
