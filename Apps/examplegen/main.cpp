@@ -142,7 +142,7 @@ ProjectRef BuildDemo() {
   rotation->ApplyState(turned);
 
   // Made after the effects clip, for the same reason: a colour grade whose effects show the
-  // curve, RGB curves, colour wheel and three-way wheel groups.
+  // curve, RGB curves, colour wheel, three-way wheel and hue range groups.
   auto gradeClip =
       b.AddClip(v1, beach, {.start = Seconds(16), .end = Seconds(22), .mediaIn = Seconds(5)});
   gradeClip->SetName("Colour Grade");
@@ -150,6 +150,7 @@ ProjectRef BuildDemo() {
   auto rgbCurves = b.AddEffect(gradeClip, kMatchName_RGBCurves);
   auto wheel = b.AddEffect(gradeClip, kMatchName_ColorBalanceWheel);
   auto threeWay = b.AddEffect(gradeClip, kMatchName_ThreeWayColor);
+  b.AddEffect(gradeClip, kMatchName_HueRange);
   // A gentle S on the luma and a warmer red; the wheels push the shadows to blue and the
   // highlights to orange.
   const auto setParam = [](const ComponentRef& effect, const std::string& name, double value) {

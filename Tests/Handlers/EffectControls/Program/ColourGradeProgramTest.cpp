@@ -1,10 +1,12 @@
 // Drags in the colour groups of the demo's "Colour Grade" clip in the program: a point of the
-// luma curve and the colour balance wheel, placed from dumps (the list's place in the panel, the
-// group rows' tops and levels, and the groups' layout rules: a curve S = (W - 55) / 2 wide at
-// the indent + 20 with a 20-pixel label strip, a wheel D = W - indent - 90 across at the
-// indent + 35, 20 below the row's top). Each drag must be one undo step, undoing both must give
-// back the saved project byte for byte, and a panel resized to 200 x 300 and back must show the
-// same layout, with no negative size while it is small.
+// luma curve, the colour balance wheel and a hue range handle, placed from dumps (the list's
+// place in the panel, the group rows' tops and levels, and the groups' layout rules: a curve
+// S = (W - 55) / 2 wide at the indent + 20 with a 20-pixel label strip; a wheel
+// D = W - indent - 90 across at the indent + 35, 20 below the row's top; a range bar
+// W - indent - 35 wide at the indent + 20, 5 below the row's top, its handles under the
+// 18-pixel bar). Each drag must be one undo step, undoing them all must give back the saved
+// project byte for byte, and a panel resized to 200 x 300 and back must show the same layout,
+// with no negative size while it is small.
 //
 // Built with EC_PROGRAM (the effectcontrols executable), EC_EXAMPLES (the example projects, whose
 // demo.json is the program's built-in demo) and EC_OUT (where the runs write).
@@ -22,6 +24,7 @@
 #include <sstream>
 #include <stdexcept>
 #include <string>
+#include <utility>
 #include <vector>
 
 extern char** environ;
@@ -193,28 +196,30 @@ class ColourGradeProgram : public ::testing::Test {
   fs::path out;
 };
 
-TEST_F(ColourGradeProgram, CurveAndWheelDragsAreOneStepEachAndUndoRestoresTheSavedProject) {
+TEST_F(ColourGradeProgram, CurveWheelAndRangeDragsAreOneStepEachAndUndoRestoresTheSavedProject) {
+  // Opens the three groups one at a time, each from a dump taken after the one before.
   std::string opening = "time 00:00:18:00\nselect " + std::to_string(clipId) + "\n";
-  const json closedDump = DumpAfter(opening, "closed.json");
-  ASSERT_FALSE(closedDump.is_null());
-  const auto curveGroup = FindRow(Panel(closedDump), {"Luma Curve", "Luma Curve"});
-  ASSERT_TRUE(curveGroup.has_value());
-  EXPECT_EQ(curveGroup->className, "GroupCurveBeginParameter");
-  opening += "click " + TrianglePoint(PlaceOf(Panel(closedDump)), *curveGroup) + "\n";
-  const json curveDump = DumpAfter(opening, "curve-open.json");
-  ASSERT_FALSE(curveDump.is_null());
-  const auto wheelGroup = FindRow(Panel(curveDump), {"Color Balance Wheel", "Balance"});
-  ASSERT_TRUE(wheelGroup.has_value());
-  EXPECT_EQ(wheelGroup->className, "GroupHueBalanceAndPhaseBeginParameter");
-  opening += "click " + TrianglePoint(PlaceOf(Panel(curveDump)), *wheelGroup) + "\n";
+  const std::vector<std::pair<std::vector<std::string>, std::string>> groups = {
+      {{"Luma Curve", "Luma Curve"}, "GroupCurveBeginParameter"},
+      {{"Color Balance Wheel", "Balance"}, "GroupHueBalanceAndPhaseBeginParameter"},
+      {{"Hue Range", "Hue Range"}, "GroupHueRangeDefinitionBeginParameter"}};
+  for (std::size_t g = 0; g < groups.size(); ++g) {
+    const json dump = DumpAfter(opening, "closed" + std::to_string(g) + ".json");
+    ASSERT_FALSE(dump.is_null());
+    const auto group = FindRow(Panel(dump), groups[g].first);
+    ASSERT_TRUE(group.has_value()) << groups[g].first.back();
+    EXPECT_EQ(group->className, groups[g].second);
+    opening += "click " + TrianglePoint(PlaceOf(Panel(dump)), *group) + "\n";
+  }
   const json openDump = DumpAfter(opening, "open.json");
   ASSERT_FALSE(openDump.is_null());
   const json& panel = Panel(openDump);
   const ListPlace list = PlaceOf(panel);
   const auto curve = FindRow(panel, {"Luma Curve", "Luma Curve"});
   const auto wheel = FindRow(panel, {"Color Balance Wheel", "Balance"});
-  ASSERT_TRUE(curve && wheel);
-  ASSERT_TRUE(curve->shown && wheel->shown);
+  const auto range = FindRow(panel, {"Hue Range", "Hue Range"});
+  ASSERT_TRUE(curve && wheel && range);
+  ASSERT_TRUE(curve->shown && wheel->shown && range->shown);
 
   // The demo's second luma point is at levels (64, 52); drag it up by a quarter of the plot.
   const int side = (list.width - 55) / 2;
@@ -230,15 +235,23 @@ TEST_F(ColourGradeProgram, CurveAndWheelDragsAreOneStepEachAndUndoRestoresTheSav
   const int centerX = list.left + indent + 35 + (diameter - 1) / 2;
   const int centerY = list.top + wheel->top + 20 + (diameter - 1) / 2;
 
+  // The hue range's end threshold handle (180 of 0..360) under its bar, 20 pixels to the left.
+  const int rangeIndent = range->groupLevel * kIndentPerGroupLevel;
+  const int rangeWidth = list.width - rangeIndent - 35;
+  const int handleX = list.left + rangeIndent + 20 + (rangeWidth - 1) / 2;
+  const int handleY = list.top + range->top + 5 + 18 + 4;
+
   std::ostringstream script;
   script << opening << "save before.project.json\n"
          << "drag " << At(pointX, pointY) << " " << At(pointX, pointY - side / 4) << " steps 5\n"
          << "dump curve.dump.json\n"
          << "drag " << At(centerX + 2, centerY) << " " << At(centerX, centerY - diameter / 4)
          << " steps 5\n"
-         << "dump wheel.dump.json\nsave edited.project.json\n"
+         << "dump wheel.dump.json\n"
+         << "drag " << At(handleX, handleY) << " " << At(handleX - 20, handleY) << " steps 4\n"
+         << "dump range.dump.json\nsave edited.project.json\n"
          << "resize 200 300\ndump tiny.dump.json\nresize 1200 2400\ndump back.dump.json\n"
-         << "undo\nundo\ndump undone.dump.json\nsave undone.project.json\n";
+         << "undo\nundo\nundo\ndump undone.dump.json\nsave undone.project.json\n";
   ASSERT_TRUE(RunProgram(out / "edits", script.str()));
 
   const json curveEdit = ReadJson(out / "edits" / "curve.dump.json");
@@ -247,6 +260,9 @@ TEST_F(ColourGradeProgram, CurveAndWheelDragsAreOneStepEachAndUndoRestoresTheSav
   const json wheelEdit = ReadJson(out / "edits" / "wheel.dump.json");
   EXPECT_EQ(UndoDone(wheelEdit),
             (std::vector<std::string>{"MZ.ComponentParam.SetValue", "MZ.ComponentParam.SetValue"}));
+  const json rangeEdit = ReadJson(out / "edits" / "range.dump.json");
+  EXPECT_EQ(UndoDone(rangeEdit).size(), 3u) << "the range handle drag is one step";
+  EXPECT_TRUE(rangeEdit.at("assertions").empty()) << rangeEdit.at("assertions").dump();
   const std::string before = ReadText(out / "edits" / "before.project.json");
   const std::string edited = ReadText(out / "edits" / "edited.project.json");
   EXPECT_NE(before, edited);
@@ -255,12 +271,12 @@ TEST_F(ColourGradeProgram, CurveAndWheelDragsAreOneStepEachAndUndoRestoresTheSav
   for (const json& row : Panel(tiny).at("rows")) {
     EXPECT_GE(row.at("height").get<int>(), 0) << row.at("path").dump();
   }
-  EXPECT_EQ(Layout(Panel(ReadJson(out / "edits" / "back.dump.json"))), Layout(Panel(wheelEdit)))
+  EXPECT_EQ(Layout(Panel(ReadJson(out / "edits" / "back.dump.json"))), Layout(Panel(rangeEdit)))
       << "resizing to tiny and back changed the layout";
 
   EXPECT_TRUE(UndoDone(ReadJson(out / "edits" / "undone.dump.json")).empty());
   EXPECT_EQ(before, ReadText(out / "edits" / "undone.project.json"))
-      << "undoing both drags did not restore the saved project";
+      << "undoing the three drags did not restore the saved project";
 }
 
 }  // namespace
