@@ -141,6 +141,39 @@ ProjectRef BuildDemo() {
   turned.value = 720.0;
   rotation->ApplyState(turned);
 
+  // Made after the effects clip, for the same reason: a colour grade whose effects show the
+  // curve, RGB curves, colour wheel, three-way wheel and hue range groups.
+  auto gradeClip =
+      b.AddClip(v1, beach, {.start = Seconds(16), .end = Seconds(22), .mediaIn = Seconds(5)});
+  gradeClip->SetName("Colour Grade");
+  auto lumaCurve = b.AddEffect(gradeClip, kMatchName_LumaCurve);
+  auto rgbCurves = b.AddEffect(gradeClip, kMatchName_RGBCurves);
+  auto wheel = b.AddEffect(gradeClip, kMatchName_ColorBalanceWheel);
+  auto threeWay = b.AddEffect(gradeClip, kMatchName_ThreeWayColor);
+  b.AddEffect(gradeClip, kMatchName_HueRange);
+  // A gentle S on the luma and a warmer red; the wheels push the shadows to blue and the
+  // highlights to orange.
+  const auto setParam = [](const ComponentRef& effect, const std::string& name, double value) {
+    effect->FindParam(name)->SetValueAt(0, ParamValue(value));
+  };
+  const auto setPoint = [&](const ComponentRef& effect, const std::string& curve, int point,
+                            double x, double y) {
+    const std::string prefix = curve + " Point " + std::to_string(point);
+    setParam(effect, prefix + " X", x);
+    setParam(effect, prefix + " Y", y);
+  };
+  setPoint(lumaCurve, "Luma", 2, 64.0, 52.0);
+  setPoint(lumaCurve, "Luma", 3, 192.0, 206.0);
+  setPoint(lumaCurve, "Luma", 4, 255.0, 255.0);
+  setPoint(rgbCurves, "Red", 2, 128.0, 142.0);
+  setPoint(rgbCurves, "Red", 3, 255.0, 255.0);
+  setParam(wheel, "Balance Angle", 30.0);
+  setParam(wheel, "Balance Magnitude", 20.0);
+  setParam(threeWay, "Shadows Angle", 230.0);
+  setParam(threeWay, "Shadows Magnitude", 25.0);
+  setParam(threeWay, "Highlights Angle", 40.0);
+  setParam(threeWay, "Highlights Magnitude", 15.0);
+
   Markers markers;
   markers.Add({Seconds(4), 0, "Cut here?", "", 1});
   markers.Add({Seconds(12), Seconds(2), "Music swell", "", 4});

@@ -1,6 +1,7 @@
 #include "Host/Model/EffectCatalogue.h"
 
 #include <cmath>
+#include <string>
 #include <utility>
 
 #include "Host/Model/ComponentParam.h"
@@ -267,11 +268,105 @@ ComponentRef Mask() {
   return effect;
 }
 
+// The 32 hidden point parameters of one tone curve: x then y of points 1 to 16, levels 0 to 255;
+// x = -1 marks an unused point. The curve starts as the diagonal.
+void AddCurvePoints(const ComponentRef& effect, const std::string& curve) {
+  constexpr int kPoints = 16;
+  constexpr double kTop = 255.0;
+  for (int i = 0; i < kPoints; ++i) {
+    const double level = i == 0 ? 0.0 : (i == 1 ? kTop : -1.0);
+    for (const char* axis : {"X", "Y"}) {
+      const std::string name = curve + " Point " + std::to_string(i + 1) + " " + axis;
+      ComponentParamRef point =
+          Scalar(name.c_str(), level, -1.0, kTop, 0, ParamUnits::None, ParamType::DoubleSlider);
+      point->SetVisible(false);
+      effect->AddParam(std::move(point));
+    }
+  }
+}
+
+ComponentRef LumaCurve() {
+  ComponentRef effect = MakeEffect(kMatchName_LumaCurve, "Luma Curve", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Group("Luma Curve", GroupKind::Curve));
+  AddCurvePoints(effect, "Luma");
+  effect->AddParam(GroupEnd());
+  return effect;
+}
+
+ComponentRef RGBCurves() {
+  ComponentRef effect = MakeEffect(kMatchName_RGBCurves, "RGB Curves", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Group("Curves", GroupKind::RGBCurves));
+  for (const char* curve : {"Master", "Red", "Green", "Blue"}) {
+    AddCurvePoints(effect, curve);
+  }
+  effect->AddParam(GroupEnd());
+  return effect;
+}
+
+// A colour wheel's two parameters: the hue angle in degrees and the balance magnitude.
+void AddWheel(const ComponentRef& effect, const std::string& wheel) {
+  effect->AddParam(Scalar((wheel + " Angle").c_str(), 0.0, -1.0e6, 1.0e6, 1, ParamUnits::Degrees,
+                          ParamType::Angle));
+  effect->AddParam(Scalar((wheel + " Magnitude").c_str(), 0.0, 0.0, 100.0, 1, ParamUnits::None,
+                          ParamType::DoubleSlider));
+}
+
+ComponentRef ColorBalanceWheel() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_ColorBalanceWheel, "Color Balance Wheel", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Group("Balance", GroupKind::HueBalanceAndPhase));
+  AddWheel(effect, "Balance");
+  effect->AddParam(GroupEnd());
+  effect->AddParam(Scalar("Saturation", 100.0, 0.0, 200.0, 1, ParamUnits::Percent));
+  return effect;
+}
+
+ComponentRef ThreeWayColor() {
+  ComponentRef effect =
+      MakeEffect(kMatchName_ThreeWayColor, "Three-Way Color", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Group("Tonal Balance", GroupKind::ThreeWayHueBalance));
+  for (const char* wheel : {"Shadows", "Midtones", "Highlights"}) {
+    AddWheel(effect, wheel);
+  }
+  effect->AddParam(Check("Link Wheels", false));
+  effect->AddParam(GroupEnd());
+  return effect;
+}
+
+// A hue range with soft edges; the end softness is measured down from 360.
+ComponentRef HueRange() {
+  ComponentRef effect = MakeEffect(kMatchName_HueRange, "Hue Range", MediaType::Video, false);
+  effect->AddParam(Group("Hue Range", GroupKind::HueRangeDefinition));
+  effect->AddParam(Check("Show Range", false));
+  effect->AddParam(
+      Scalar("Start Threshold", 60.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(
+      Scalar("Start Softness", 30.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(
+      Scalar("End Threshold", 180.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(
+      Scalar("End Softness", 150.0, 0.0, 360.0, 1, ParamUnits::Degrees, ParamType::DoubleSlider));
+  effect->AddParam(GroupEnd());
+  effect->AddParam(Scalar("Desaturate Outside", 0.0, 0.0, 100.0, 1, ParamUnits::Percent));
+  return effect;
+}
+
 EffectCatalogue MakeStandard() {
   EffectCatalogue catalogue;
-  for (ComponentRef effect : {Motion(), Opacity(), TimeRemapping(), Volume(), ChannelVolume(),
-                              Panner(), GaussianBlur(), BrightnessContrast(), Crop(), Tint(),
-                              Timecode(), GridDistortion(), Delay(), Mask(), MatteFromTrack()}) {
+  for (ComponentRef effect : {Motion(),         Opacity(),
+                              TimeRemapping(),  Volume(),
+                              ChannelVolume(),  Panner(),
+                              GaussianBlur(),   BrightnessContrast(),
+                              Crop(),           Tint(),
+                              Timecode(),       GridDistortion(),
+                              Delay(),          Mask(),
+                              MatteFromTrack(), LumaCurve(),
+                              RGBCurves(),      ColorBalanceWheel(),
+                              ThreeWayColor(),  HueRange()}) {
     catalogue.Register(std::move(effect));
   }
   DescribeAudioParams(catalogue);

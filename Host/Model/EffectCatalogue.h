@@ -25,6 +25,11 @@ inline constexpr const char* kMatchName_GridDistortion = "XO.KRVN GridDistortion
 inline constexpr const char* kMatchName_Delay = "XO.KRVN Delay";
 inline constexpr const char* kMatchName_Mask = "XO.KRVN Mask";
 inline constexpr const char* kMatchName_MatteFromTrack = "XO.KRVN MatteFromTrack";
+inline constexpr const char* kMatchName_LumaCurve = "XO.KRVN LumaCurve";
+inline constexpr const char* kMatchName_RGBCurves = "XO.KRVN RGBCurves";
+inline constexpr const char* kMatchName_ColorBalanceWheel = "XO.KRVN ColorBalanceWheel";
+inline constexpr const char* kMatchName_ThreeWayColor = "XO.KRVN ThreeWayColor";
+inline constexpr const char* kMatchName_HueRange = "XO.KRVN HueRange";
 
 // Positions (from 0) of the mask parameters the tracker works with.
 inline constexpr std::size_t kMaskParamPath = 6;

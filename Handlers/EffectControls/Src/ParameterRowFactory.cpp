@@ -10,6 +10,11 @@
 #include "Handlers/EffectControls/Src/AudioFloatSliderParameter.h"
 #include "Handlers/EffectControls/Src/ButtonParameter.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Handlers/EffectControls/Src/GroupCurveBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupHueBalanceAndPhaseBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupHueRangeDefinitionBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupRGBCurvesBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupThreeWayHueBalanceBeginParameter.h"
 #include "Handlers/EffectControls/Src/OpaqueParameter.h"
 #include "Handlers/EffectControls/Src/PointSliderParameter.h"
 #include "Handlers/EffectControls/Src/TimecodeParameter.h"
@@ -224,25 +229,25 @@ std::shared_ptr<GroupBeginParameter> ParameterRowFactory::CreateGroupRow(
   }
   switch (info.param->GetGroupKind()) {
     case GroupKind::HueBalanceAndPhase:
-      return GroupStandIn("GroupHueBalanceAndPhaseBeginParameter", info);
+      return std::make_shared<GroupHueBalanceAndPhaseBeginParameter>(info);
     case GroupKind::ThreeWayHueBalance:
-      return GroupStandIn("GroupThreeWayHueBalanceBeginParameter", info);
+      return std::make_shared<GroupThreeWayHueBalanceBeginParameter>(info);
     case GroupKind::TonalRangeDefinition:
       return GroupStandIn("GroupTonalRangeDefinitionBeginParameter", info);
     case GroupKind::Levels:
       return GroupStandIn("GroupLevelsBeginParameter", info);
     case GroupKind::RGBCurves:
-      return GroupStandIn("GroupRGBCurvesBeginParameter", info);
+      return std::make_shared<GroupRGBCurvesBeginParameter>(info);
     case GroupKind::Buttons:
       return GroupStandIn(request.componentIsMask ? "GroupTrackerButtonsBeginParameter"
                                                   : "GroupButtonsBeginParameter",
                           info);
     case GroupKind::Curve:
-      return GroupStandIn("GroupCurveBeginParameter", info);
+      return std::make_shared<GroupCurveBeginParameter>(info);
     case GroupKind::ColorPickerRange:
       return GroupStandIn("GroupColorPickerRangeBeginParameter", info);
     case GroupKind::HueRangeDefinition:
-      return GroupStandIn("GroupHueRangeDefinitionBeginParameter", info);
+      return std::make_shared<GroupHueRangeDefinitionBeginParameter>(info);
     case GroupKind::SaturationRangeDefinition:
       return GroupStandIn("GroupSaturationRangeDefinitionBeginParameter", info);
     case GroupKind::LumaRangeDefinition:

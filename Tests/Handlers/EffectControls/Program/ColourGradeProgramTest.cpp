@@ -1,0 +1,282 @@
+// Drags in the colour groups of the demo's "Colour Grade" clip in the program: a point of the
+// luma curve, the colour balance wheel and a hue range handle, placed from dumps (the list's
+// place in the panel, the group rows' tops and levels, and the groups' layout rules: a curve
+// S = (W - 55) / 2 wide at the indent + 20 with a 20-pixel label strip; a wheel
+// D = W - indent - 90 across at the indent + 35, 20 below the row's top; a range bar
+// W - indent - 35 wide at the indent + 20, 5 below the row's top, its handles under the
+// 18-pixel bar). Each drag must be one undo step, undoing them all must give back the saved
+// project byte for byte, and a panel resized to 200 x 300 and back must show the same layout,
+// with no negative size while it is small.
+//
+// Built with EC_PROGRAM (the effectcontrols executable), EC_EXAMPLES (the example projects, whose
+// demo.json is the program's built-in demo) and EC_OUT (where the runs write).
+#include <fcntl.h>
+#include <gtest/gtest.h>
+#include <spawn.h>
+#include <sys/wait.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <nlohmann/json.hpp>
+#include <optional>
+#include <sstream>
+#include <stdexcept>
+#include <string>
+#include <utility>
+#include <vector>
+
+extern char** environ;
+
+namespace {
+
+namespace fs = std::filesystem;
+using nlohmann::json;
+
+constexpr const char* kSize = "1200x2400";
+constexpr int kIndentPerGroupLevel = 17;
+
+std::string ReadText(const fs::path& path) {
+  std::ifstream in(path, std::ios::binary);
+  return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
+}
+
+json ReadJson(const fs::path& path) {
+  std::ifstream in(path);
+  return json::parse(in);
+}
+
+// The id of the demo's clip named "Colour Grade".
+std::optional<long long> ColourGradeClipId() {
+  const json demo = ReadJson(fs::path(EC_EXAMPLES) / "demo.json");
+  for (const json& sequence : demo.at("sequences")) {
+    for (const json& track : sequence.at("tracks")) {
+      for (const json& item : track.at("items")) {
+        if (item.value("name", "") == "Colour Grade") {
+          return item.at("id").get<long long>();
+        }
+      }
+    }
+  }
+  return std::nullopt;
+}
+
+// Runs the program on the demo with `script`; false (with a failure) when it does not end well.
+bool RunProgram(const fs::path& out, const std::string& script) {
+  const fs::path scriptPath = out / "script.ecs";
+  std::ofstream(scriptPath) << script;
+  const fs::path log = out / "run.log";
+  std::vector<std::string> args{EC_PROGRAM, "--headless",        "--size", kSize,
+                                "--script", scriptPath.string(), "--out",  out.string()};
+  std::vector<char*> argv;
+  for (std::string& arg : args) {
+    argv.push_back(arg.data());
+  }
+  argv.push_back(nullptr);
+  posix_spawn_file_actions_t actions;
+  posix_spawn_file_actions_init(&actions);
+  posix_spawn_file_actions_addopen(&actions, 1, log.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
+  posix_spawn_file_actions_adddup2(&actions, 1, 2);
+  pid_t pid = 0;
+  const int spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ);
+  posix_spawn_file_actions_destroy(&actions);
+  if (spawned != 0) {
+    ADD_FAILURE() << "cannot start " << EC_PROGRAM;
+    return false;
+  }
+  int status = 0;
+  waitpid(pid, &status, 0);
+  const std::string text = ReadText(log);
+  if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
+    ADD_FAILURE() << "the run in " << out << " failed (status " << status << ")\n" << text;
+    return false;
+  }
+  EXPECT_EQ(text.find("warning:"), std::string::npos) << "a click went nowhere:\n" << text;
+  return true;
+}
+
+const json& Panel(const json& dump) {
+  for (const json& panel : dump.at("panels")) {
+    if (panel.value("dumped", false)) {
+      return panel;
+    }
+  }
+  throw std::runtime_error("no panel dumped");
+}
+
+// A row of the dump by the last titles of its path; `nth` picks among rows of the same path.
+struct Row {
+  std::string className;
+  int top = 0;
+  int height = 0;
+  int groupLevel = 0;
+  bool shown = false;
+};
+
+std::optional<Row> FindRow(const json& panel, const std::vector<std::string>& pathEnd,
+                           int nth = 0) {
+  for (const json& row : panel.at("rows")) {
+    const auto path = row.at("path").get<std::vector<std::string>>();
+    if (path.size() < pathEnd.size() ||
+        !std::equal(pathEnd.rbegin(), pathEnd.rend(), path.rbegin())) {
+      continue;
+    }
+    if (nth-- > 0) {
+      continue;
+    }
+    return Row{row.at("class").get<std::string>(), row.at("top").get<int>(),
+               row.at("height").get<int>(), row.at("groupLevel").get<int>(),
+               row.at("shown").get<bool>()};
+  }
+  return std::nullopt;
+}
+
+// Where the list lies in the panel, from the view's facts.
+struct ListPlace {
+  int left = 0;
+  int top = 0;
+  int width = 0;
+};
+
+ListPlace PlaceOf(const json& panel) {
+  const json& extra = panel.at("extra");
+  return {extra.at("listLeft").get<int>(), extra.at("listTop").get<int>(),
+          extra.at("listWidth").get<int>()};
+}
+
+// The disclosure triangle at the row's indent + 3.
+std::string TrianglePoint(const ListPlace& list, const Row& row) {
+  std::ostringstream text;
+  text << list.left + row.groupLevel * kIndentPerGroupLevel + 3 + 5 << " "
+       << list.top + row.top + 10;
+  return text.str();
+}
+
+std::vector<std::string> UndoDone(const json& dump) {
+  return dump.at("undo").at("done").get<std::vector<std::string>>();
+}
+
+// "x y" in panel coordinates.
+std::string At(int x, int y) {
+  return std::to_string(x) + " " + std::to_string(y);
+}
+
+// Every row's path, top and height, one line each: what "the same layout" compares.
+std::string Layout(const json& panel) {
+  std::string text;
+  for (const json& row : panel.at("rows")) {
+    text += row.at("path").dump() + " " + std::to_string(row.at("top").get<int>()) + " " +
+            std::to_string(row.at("height").get<int>()) + "\n";
+  }
+  return text;
+}
+
+class ColourGradeProgram : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    const auto id = ColourGradeClipId();
+    ASSERT_TRUE(id.has_value()) << "the demo has no Colour Grade clip";
+    clipId = *id;
+    out = fs::path(EC_OUT);
+    fs::remove_all(out);
+    fs::create_directories(out / "layout");
+    fs::create_directories(out / "edits");
+  }
+
+  // Runs `opening` and dumps; the panel of the dump.
+  json DumpAfter(const std::string& opening, const std::string& name) {
+    if (!RunProgram(out / "layout", opening + "dump " + name + "\n")) {
+      return {};
+    }
+    return ReadJson(out / "layout" / name);
+  }
+
+  long long clipId = 0;
+  fs::path out;
+};
+
+TEST_F(ColourGradeProgram, CurveWheelAndRangeDragsAreOneStepEachAndUndoRestoresTheSavedProject) {
+  // Opens the three groups one at a time, each from a dump taken after the one before.
+  std::string opening = "time 00:00:18:00\nselect " + std::to_string(clipId) + "\n";
+  const std::vector<std::pair<std::vector<std::string>, std::string>> groups = {
+      {{"Luma Curve", "Luma Curve"}, "GroupCurveBeginParameter"},
+      {{"Color Balance Wheel", "Balance"}, "GroupHueBalanceAndPhaseBeginParameter"},
+      {{"Hue Range", "Hue Range"}, "GroupHueRangeDefinitionBeginParameter"}};
+  for (std::size_t g = 0; g < groups.size(); ++g) {
+    const json dump = DumpAfter(opening, "closed" + std::to_string(g) + ".json");
+    ASSERT_FALSE(dump.is_null());
+    const auto group = FindRow(Panel(dump), groups[g].first);
+    ASSERT_TRUE(group.has_value()) << groups[g].first.back();
+    EXPECT_EQ(group->className, groups[g].second);
+    opening += "click " + TrianglePoint(PlaceOf(Panel(dump)), *group) + "\n";
+  }
+  const json openDump = DumpAfter(opening, "open.json");
+  ASSERT_FALSE(openDump.is_null());
+  const json& panel = Panel(openDump);
+  const ListPlace list = PlaceOf(panel);
+  const auto curve = FindRow(panel, {"Luma Curve", "Luma Curve"});
+  const auto wheel = FindRow(panel, {"Color Balance Wheel", "Balance"});
+  const auto range = FindRow(panel, {"Hue Range", "Hue Range"});
+  ASSERT_TRUE(curve && wheel && range);
+  ASSERT_TRUE(curve->shown && wheel->shown && range->shown);
+
+  // The demo's second luma point is at levels (64, 52); drag it up by a quarter of the plot.
+  const int side = (list.width - 55) / 2;
+  const int curveLeft = list.left + curve->groupLevel * kIndentPerGroupLevel + 20;
+  const int plotBottom = list.top + curve->top + 20 + side - 1;
+  const auto level = [&](int value) { return (value * (side - 1) + 127) / 255; };
+  const int pointX = curveLeft + level(64);
+  const int pointY = plotBottom - level(52);
+  // The wheel's centre, and a quarter of its diameter above it.
+  const int indent = wheel->groupLevel * kIndentPerGroupLevel;
+  const int diameter = list.width - indent - 90;
+  ASSERT_GT(diameter, 40);
+  const int centerX = list.left + indent + 35 + (diameter - 1) / 2;
+  const int centerY = list.top + wheel->top + 20 + (diameter - 1) / 2;
+
+  // The hue range's end threshold handle (180 of 0..360) under its bar, 20 pixels to the left.
+  const int rangeIndent = range->groupLevel * kIndentPerGroupLevel;
+  const int rangeWidth = list.width - rangeIndent - 35;
+  const int handleX = list.left + rangeIndent + 20 + (rangeWidth - 1) / 2;
+  const int handleY = list.top + range->top + 5 + 18 + 4;
+
+  std::ostringstream script;
+  script << opening << "save before.project.json\n"
+         << "drag " << At(pointX, pointY) << " " << At(pointX, pointY - side / 4) << " steps 5\n"
+         << "dump curve.dump.json\n"
+         << "drag " << At(centerX + 2, centerY) << " " << At(centerX, centerY - diameter / 4)
+         << " steps 5\n"
+         << "dump wheel.dump.json\n"
+         << "drag " << At(handleX, handleY) << " " << At(handleX - 20, handleY) << " steps 4\n"
+         << "dump range.dump.json\nsave edited.project.json\n"
+         << "resize 200 300\ndump tiny.dump.json\nresize 1200 2400\ndump back.dump.json\n"
+         << "undo\nundo\nundo\ndump undone.dump.json\nsave undone.project.json\n";
+  ASSERT_TRUE(RunProgram(out / "edits", script.str()));
+
+  const json curveEdit = ReadJson(out / "edits" / "curve.dump.json");
+  EXPECT_EQ(UndoDone(curveEdit), (std::vector<std::string>{"MZ.ComponentParam.SetValue"}));
+  EXPECT_TRUE(curveEdit.at("assertions").empty()) << curveEdit.at("assertions").dump();
+  const json wheelEdit = ReadJson(out / "edits" / "wheel.dump.json");
+  EXPECT_EQ(UndoDone(wheelEdit),
+            (std::vector<std::string>{"MZ.ComponentParam.SetValue", "MZ.ComponentParam.SetValue"}));
+  const json rangeEdit = ReadJson(out / "edits" / "range.dump.json");
+  EXPECT_EQ(UndoDone(rangeEdit).size(), 3u) << "the range handle drag is one step";
+  EXPECT_TRUE(rangeEdit.at("assertions").empty()) << rangeEdit.at("assertions").dump();
+  const std::string before = ReadText(out / "edits" / "before.project.json");
+  const std::string edited = ReadText(out / "edits" / "edited.project.json");
+  EXPECT_NE(before, edited);
+
+  const json tiny = ReadJson(out / "edits" / "tiny.dump.json");
+  for (const json& row : Panel(tiny).at("rows")) {
+    EXPECT_GE(row.at("height").get<int>(), 0) << row.at("path").dump();
+  }
+  EXPECT_EQ(Layout(Panel(ReadJson(out / "edits" / "back.dump.json"))), Layout(Panel(rangeEdit)))
+      << "resizing to tiny and back changed the layout";
+
+  EXPECT_TRUE(UndoDone(ReadJson(out / "edits" / "undone.dump.json")).empty());
+  EXPECT_EQ(before, ReadText(out / "edits" / "undone.project.json"))
+      << "undoing the three drags did not restore the saved project";
+}
+
+}  // namespace
