@@ -10,10 +10,7 @@
 //
 // Built with EC_PROGRAM (the effectcontrols executable), EC_EXAMPLES (the example projects, whose
 // demo.json is the program's built-in demo) and EC_OUT (where the runs write).
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <spawn.h>
-#include <sys/wait.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -27,24 +24,17 @@
 #include <utility>
 #include <vector>
 
-extern char** environ;
+#include "Tests/Handlers/EffectControls/Program/ScriptedPanelRun.h"
 
 namespace {
 
-namespace fs = std::filesystem;
-using nlohmann::json;
+using namespace program_test;
 
 constexpr const char* kSize = "1200x2400";
-constexpr int kIndentPerGroupLevel = 17;
 
-std::string ReadText(const fs::path& path) {
-  std::ifstream in(path, std::ios::binary);
-  return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
-}
-
-json ReadJson(const fs::path& path) {
-  std::ifstream in(path);
-  return json::parse(in);
+// The program's options for every run: a panel tall enough for the expanded groups.
+std::vector<std::string> Options() {
+  return {"--size", kSize};
 }
 
 // The id of the demo's clip named "Colour Grade".
@@ -60,101 +50,6 @@ std::optional<long long> ColourGradeClipId() {
     }
   }
   return std::nullopt;
-}
-
-// Runs the program on the demo with `script`; false (with a failure) when it does not end well.
-bool RunProgram(const fs::path& out, const std::string& script) {
-  const fs::path scriptPath = out / "script.ecs";
-  std::ofstream(scriptPath) << script;
-  const fs::path log = out / "run.log";
-  std::vector<std::string> args{EC_PROGRAM, "--headless",        "--size", kSize,
-                                "--script", scriptPath.string(), "--out",  out.string()};
-  std::vector<char*> argv;
-  for (std::string& arg : args) {
-    argv.push_back(arg.data());
-  }
-  argv.push_back(nullptr);
-  posix_spawn_file_actions_t actions;
-  posix_spawn_file_actions_init(&actions);
-  posix_spawn_file_actions_addopen(&actions, 1, log.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
-  posix_spawn_file_actions_adddup2(&actions, 1, 2);
-  pid_t pid = 0;
-  const int spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ);
-  posix_spawn_file_actions_destroy(&actions);
-  if (spawned != 0) {
-    ADD_FAILURE() << "cannot start " << EC_PROGRAM;
-    return false;
-  }
-  int status = 0;
-  waitpid(pid, &status, 0);
-  const std::string text = ReadText(log);
-  if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
-    ADD_FAILURE() << "the run in " << out << " failed (status " << status << ")\n" << text;
-    return false;
-  }
-  EXPECT_EQ(text.find("warning:"), std::string::npos) << "a click went nowhere:\n" << text;
-  return true;
-}
-
-const json& Panel(const json& dump) {
-  for (const json& panel : dump.at("panels")) {
-    if (panel.value("dumped", false)) {
-      return panel;
-    }
-  }
-  throw std::runtime_error("no panel dumped");
-}
-
-// A row of the dump by the last titles of its path; `nth` picks among rows of the same path.
-struct Row {
-  std::string className;
-  int top = 0;
-  int height = 0;
-  int groupLevel = 0;
-  bool shown = false;
-};
-
-std::optional<Row> FindRow(const json& panel, const std::vector<std::string>& pathEnd,
-                           int nth = 0) {
-  for (const json& row : panel.at("rows")) {
-    const auto path = row.at("path").get<std::vector<std::string>>();
-    if (path.size() < pathEnd.size() ||
-        !std::equal(pathEnd.rbegin(), pathEnd.rend(), path.rbegin())) {
-      continue;
-    }
-    if (nth-- > 0) {
-      continue;
-    }
-    return Row{row.at("class").get<std::string>(), row.at("top").get<int>(),
-               row.at("height").get<int>(), row.at("groupLevel").get<int>(),
-               row.at("shown").get<bool>()};
-  }
-  return std::nullopt;
-}
-
-// Where the list lies in the panel, from the view's facts.
-struct ListPlace {
-  int left = 0;
-  int top = 0;
-  int width = 0;
-};
-
-ListPlace PlaceOf(const json& panel) {
-  const json& extra = panel.at("extra");
-  return {extra.at("listLeft").get<int>(), extra.at("listTop").get<int>(),
-          extra.at("listWidth").get<int>()};
-}
-
-// The disclosure triangle at the row's indent + 3.
-std::string TrianglePoint(const ListPlace& list, const Row& row) {
-  std::ostringstream text;
-  text << list.left + row.groupLevel * kIndentPerGroupLevel + 3 + 5 << " "
-       << list.top + row.top + 10;
-  return text.str();
-}
-
-std::vector<std::string> UndoDone(const json& dump) {
-  return dump.at("undo").at("done").get<std::vector<std::string>>();
 }
 
 // "x y" in panel coordinates.
@@ -186,7 +81,7 @@ class ColourGradeProgram : public ::testing::Test {
 
   // Runs `opening` and dumps; the panel of the dump.
   json DumpAfter(const std::string& opening, const std::string& name) {
-    if (!RunProgram(out / "layout", opening + "dump " + name + "\n")) {
+    if (!RunProgram(out / "layout", opening + "dump " + name + "\n", Options())) {
       return {};
     }
     return ReadJson(out / "layout" / name);
@@ -252,7 +147,7 @@ TEST_F(ColourGradeProgram, CurveWheelAndRangeDragsAreOneStepEachAndUndoRestoresT
          << "dump range.dump.json\nsave edited.project.json\n"
          << "resize 200 300\ndump tiny.dump.json\nresize 1200 2400\ndump back.dump.json\n"
          << "undo\nundo\nundo\ndump undone.dump.json\nsave undone.project.json\n";
-  ASSERT_TRUE(RunProgram(out / "edits", script.str()));
+  ASSERT_TRUE(RunProgram(out / "edits", script.str(), Options()));
 
   const json curveEdit = ReadJson(out / "edits" / "curve.dump.json");
   EXPECT_EQ(UndoDone(curveEdit), (std::vector<std::string>{"MZ.ComponentParam.SetValue"}));

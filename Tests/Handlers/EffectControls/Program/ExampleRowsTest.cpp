@@ -7,10 +7,7 @@
 //
 // Built with EC_PROGRAM (the effectcontrols executable), EC_EXAMPLES (the folder of example
 // projects) and EC_OUT (where the runs write, one folder per project).
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <spawn.h>
-#include <sys/wait.h>
 
 #include <algorithm>
 #include <array>
@@ -26,9 +23,11 @@
 #include <utility>
 #include <vector>
 
-extern char** environ;
+#include "Tests/Handlers/EffectControls/Program/ScriptedPanelRun.h"
 
 namespace {
+
+using program_test::RunProgramWith;
 
 namespace fs = std::filesystem;
 using nlohmann::json;
@@ -55,11 +54,6 @@ constexpr long long kMaxPartOrderKey = 10000;
 json ReadJson(const fs::path& path) {
   std::ifstream in(path);
   return json::parse(in);
-}
-
-std::string ReadText(const fs::path& path) {
-  std::ifstream in(path);
-  return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
 }
 
 // `object[key]` when it is an array, else an empty one: a file may leave a list out.
@@ -141,30 +135,10 @@ bool RunSelections(const Project& project, const fs::path& out) {
     }
     lines << "select-none\ndump none.json\n";
   }
-  const fs::path log = out / "run.log";
-  std::vector<std::string> args{EC_PROGRAM, "--headless",    "--project", project.file.string(),
-                                "--script", script.string(), "--out",     out.string()};
-  std::vector<char*> argv;
-  for (std::string& arg : args) {
-    argv.push_back(arg.data());
-  }
-  argv.push_back(nullptr);
-  posix_spawn_file_actions_t actions;
-  posix_spawn_file_actions_init(&actions);
-  posix_spawn_file_actions_addopen(&actions, 1, log.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
-  posix_spawn_file_actions_adddup2(&actions, 1, 2);
-  pid_t pid = 0;
-  const int spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ);
-  posix_spawn_file_actions_destroy(&actions);
-  if (spawned != 0) {
-    ADD_FAILURE() << "cannot start " << EC_PROGRAM;
-    return false;
-  }
-  int status = 0;
-  waitpid(pid, &status, 0);
-  if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
-    ADD_FAILURE() << project.name << ": the run failed (status " << status << ")\n"
-                  << ReadText(log);
+  if (!RunProgramWith({"--headless", "--project", project.file.string(), "--script",
+                       script.string(), "--out", out.string()},
+                      out / "run.log")) {
+    ADD_FAILURE() << project.name << ": the run failed";
     return false;
   }
   bool complete = true;

@@ -6,10 +6,7 @@
 // Built with EC_PROGRAM (the effectcontrols executable) and EC_OUT (where the runs write).
 // Track-item ids are those of examples/demo.json (21: Beach.mov with Brightness & Contrast
 // and Gaussian Blur, 81: a clip with its intrinsic effects only, 111: the title).
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <spawn.h>
-#include <sys/wait.h>
 
 #include <algorithm>
 #include <filesystem>
@@ -20,18 +17,16 @@
 #include <string>
 #include <vector>
 
-extern char** environ;
+#include "Tests/Handlers/EffectControls/Program/ScriptedPanelRun.h"
 
 namespace {
+
+using program_test::ReadText;
+using program_test::RunProgramWith;
 
 namespace fs = std::filesystem;
 using nlohmann::json;
 using Strings = std::vector<std::string>;
-
-std::string ReadText(const fs::path& path) {
-  std::ifstream in(path);
-  return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
-}
 
 class SelectionSession : public ::testing::Test {
  protected:
@@ -49,31 +44,12 @@ class SelectionSession : public ::testing::Test {
       }
     }
     const fs::path log = dir / "run.log";
-    Strings args{EC_PROGRAM, "--headless",    "--size", "1100x620",
-                 "--script", script.string(), "--out",  dir.string()};
-    std::vector<char*> argv;
-    for (std::string& arg : args) {
-      argv.push_back(arg.data());
-    }
-    argv.push_back(nullptr);
-    posix_spawn_file_actions_t actions;
-    posix_spawn_file_actions_init(&actions);
-    posix_spawn_file_actions_addopen(&actions, 1, log.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
-    posix_spawn_file_actions_adddup2(&actions, 1, 2);
-    pid_t pid = 0;
-    const int spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ);
-    posix_spawn_file_actions_destroy(&actions);
-    if (spawned != 0) {
-      ADD_FAILURE() << "cannot start " << EC_PROGRAM;
+    if (!RunProgramWith({"--headless", "--size", "1100x620", "--script", script.string(), "--out",
+                         dir.string()},
+                        log)) {
       return false;
     }
-    int status = 0;
-    waitpid(pid, &status, 0);
     const std::string output = ReadText(log);
-    if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
-      ADD_FAILURE() << name << ": the run failed (status " << status << ")\n" << output;
-      return false;
-    }
     if (output.find("warning:") != std::string::npos) {
       ADD_FAILURE() << name << ": a click or an answer went nowhere\n" << output;
       return false;

@@ -8,10 +8,7 @@
 //
 // Built with EC_PROGRAM (the effectcontrols executable), EC_EXAMPLES (the example projects, whose
 // demo.json is the program's built-in demo) and EC_OUT (where the runs write).
-#include <fcntl.h>
 #include <gtest/gtest.h>
-#include <spawn.h>
-#include <sys/wait.h>
 
 #include <filesystem>
 #include <fstream>
@@ -22,25 +19,19 @@
 #include <string>
 #include <vector>
 
-extern char** environ;
+#include "Tests/Handlers/EffectControls/Program/ScriptedPanelRun.h"
 
 namespace {
 
-namespace fs = std::filesystem;
-using nlohmann::json;
+using namespace program_test;
 
 constexpr const char* kOwnRowsPreference = "effect.controls.own.slider.rows";
 constexpr const char* kSize = "1200x1400";
-constexpr int kIndentPerGroupLevel = 17;
 
-std::string ReadText(const fs::path& path) {
-  std::ifstream in(path, std::ios::binary);
-  return {std::istreambuf_iterator<char>(in), std::istreambuf_iterator<char>()};
-}
-
-json ReadJson(const fs::path& path) {
-  std::ifstream in(path);
-  return json::parse(in);
+// The program's options for a run in one row style.
+std::vector<std::string> Options(bool ownRows) {
+  return {"--size", kSize, "--pref",
+          std::string(kOwnRowsPreference) + (ownRows ? "=true" : "=false")};
 }
 
 // The id of the demo's clip that carries Matte From Track (and with it the timecode, button and
@@ -90,93 +81,6 @@ const json* FindParam(const json& project, long long itemId, const char* matchNa
   return nullptr;
 }
 
-// Runs the program on the demo with `script`; false (with a failure) when it does not end well.
-bool RunProgram(const fs::path& out, const std::string& script, bool ownRows) {
-  const fs::path scriptPath = out / "script.ecs";
-  std::ofstream(scriptPath) << script;
-  const fs::path log = out / "run.log";
-  std::vector<std::string> args{
-      EC_PROGRAM, "--headless",
-      "--size",   kSize,
-      "--pref",   std::string(kOwnRowsPreference) + (ownRows ? "=true" : "=false"),
-      "--script", scriptPath.string(),
-      "--out",    out.string()};
-  std::vector<char*> argv;
-  for (std::string& arg : args) {
-    argv.push_back(arg.data());
-  }
-  argv.push_back(nullptr);
-  posix_spawn_file_actions_t actions;
-  posix_spawn_file_actions_init(&actions);
-  posix_spawn_file_actions_addopen(&actions, 1, log.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0644);
-  posix_spawn_file_actions_adddup2(&actions, 1, 2);
-  pid_t pid = 0;
-  const int spawned = posix_spawn(&pid, argv[0], &actions, nullptr, argv.data(), environ);
-  posix_spawn_file_actions_destroy(&actions);
-  if (spawned != 0) {
-    ADD_FAILURE() << "cannot start " << EC_PROGRAM;
-    return false;
-  }
-  int status = 0;
-  waitpid(pid, &status, 0);
-  const std::string text = ReadText(log);
-  if (!WIFEXITED(status) || WEXITSTATUS(status) != 0) {
-    ADD_FAILURE() << "the run in " << out << " failed (status " << status << ")\n" << text;
-    return false;
-  }
-  EXPECT_EQ(text.find("warning:"), std::string::npos) << "a click went nowhere:\n" << text;
-  return true;
-}
-
-const json& Panel(const json& dump) {
-  for (const json& panel : dump.at("panels")) {
-    if (panel.value("dumped", false)) {
-      return panel;
-    }
-  }
-  throw std::runtime_error("no panel dumped");
-}
-
-// A row of the dump by the last titles of its path; `nth` picks among rows of the same path.
-struct Row {
-  std::string className;
-  int top = 0;
-  int height = 0;
-  int groupLevel = 0;
-  bool shown = false;
-};
-
-std::optional<Row> FindRow(const json& panel, const std::vector<std::string>& pathEnd,
-                           int nth = 0) {
-  for (const json& row : panel.at("rows")) {
-    const auto path = row.at("path").get<std::vector<std::string>>();
-    if (path.size() < pathEnd.size() ||
-        !std::equal(pathEnd.rbegin(), pathEnd.rend(), path.rbegin())) {
-      continue;
-    }
-    if (nth-- > 0) {
-      continue;
-    }
-    return Row{row.at("class").get<std::string>(), row.at("top").get<int>(),
-               row.at("height").get<int>(), row.at("groupLevel").get<int>(),
-               row.at("shown").get<bool>()};
-  }
-  return std::nullopt;
-}
-
-// Where the list lies in the panel, from the view's facts.
-struct ListPlace {
-  int left = 0;
-  int top = 0;
-  int width = 0;
-};
-
-ListPlace PlaceOf(const json& panel) {
-  const json& extra = panel.at("extra");
-  return {extra.at("listLeft").get<int>(), extra.at("listTop").get<int>(),
-          extra.at("listWidth").get<int>()};
-}
-
 // Panel coordinates of a point `dx` into the row's value controls, halfway down its band.
 std::string ControlPoint(const ListPlace& list, const Row& row, int dx) {
   const int controlsLeft = row.groupLevel * kIndentPerGroupLevel + list.width / 2 - 20;
@@ -186,22 +90,11 @@ std::string ControlPoint(const ListPlace& list, const Row& row, int dx) {
 }
 
 // The disclosure triangle at the row's indent + 3.
-std::string TrianglePoint(const ListPlace& list, const Row& row) {
-  std::ostringstream text;
-  text << list.left + row.groupLevel * kIndentPerGroupLevel + 3 + 5 << " "
-       << list.top + row.top + 10;
-  return text.str();
-}
-
 std::string StopwatchPoint(const ListPlace& list, const Row& row) {
   std::ostringstream text;
   text << list.left + row.groupLevel * kIndentPerGroupLevel + 20 + 8 << " "
        << list.top + row.top + 10;
   return text.str();
-}
-
-std::vector<std::string> UndoDone(const json& dump) {
-  return dump.at("undo").at("done").get<std::vector<std::string>>();
 }
 
 class ValueRowsProgram : public ::testing::TestWithParam<bool> {
@@ -220,7 +113,7 @@ class ValueRowsProgram : public ::testing::TestWithParam<bool> {
   // parameter, and dumps the rows; `opening` is set to the script lines that got there.
   json Layout(std::string& opening) {
     opening = "time 00:00:11:00\nselect " + std::to_string(clipId) + "\n";
-    if (!RunProgram(out / "layout", opening + "dump closed.json\n", GetParam())) {
+    if (!RunProgram(out / "layout", opening + "dump closed.json\n", Options(GetParam()))) {
       return {};
     }
     const json closedDump = ReadJson(out / "layout" / "closed.json");
@@ -231,7 +124,7 @@ class ValueRowsProgram : public ::testing::TestWithParam<bool> {
       return {};
     }
     opening += "click " + TrianglePoint(PlaceOf(closed), *group) + "\n";
-    if (!RunProgram(out / "layout", opening + "dump rows.json\n", GetParam())) {
+    if (!RunProgram(out / "layout", opening + "dump rows.json\n", Options(GetParam()))) {
       return {};
     }
     return ReadJson(out / "layout" / "rows.json");
@@ -357,7 +250,7 @@ TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProje
     script << "undo\n";
   }
   script << "dump undone.dump.json\nsave undone.project.json\n";
-  ASSERT_TRUE(RunProgram(out / "edits", script.str(), ownRows));
+  ASSERT_TRUE(RunProgram(out / "edits", script.str(), Options(ownRows)));
 
   for (std::size_t i = 0; i < edits.size(); ++i) {
     const json dump = ReadJson(out / "edits" / ("edit" + std::to_string(i) + ".dump.json"));
