@@ -1,5 +1,5 @@
 # Every target bootstraps the machine first, so each is one command on a fresh Debian machine.
-.PHONY: bootstrap demo test dev bench fuzz memory format clean
+.PHONY: bootstrap demo test dev bench fuzz memory soak format clean
 
 bootstrap:
 	@scripts/bootstrap
@@ -36,6 +36,15 @@ memory: bootstrap
 	cmake --preset release
 	cmake --build --preset release
 	scripts/memory-check build/release/Apps/effectcontrols/effectcontrols
+
+# A long random session under the sanitizers (MONKEY_EVENTS events from MONKEY_SEED); a failure is
+# cut down to the shortest prefix that shows it.
+MONKEY_EVENTS ?= 100000
+MONKEY_SEED ?= 20261207
+soak: bootstrap
+	cmake --preset asan
+	cmake --build --preset asan --target effectcontrols
+	scripts/monkey build/asan/Apps/effectcontrols/effectcontrols $(MONKEY_EVENTS) $(MONKEY_SEED)
 
 format:
 	git ls-files '*.h' '*.cpp' | xargs clang-format -i

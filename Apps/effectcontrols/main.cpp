@@ -4,6 +4,7 @@
 
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
 #include <iostream>
 #include <memory>
 #include <string>
@@ -16,8 +17,12 @@
 #include "Host/Messaging/Preferences.h"
 #include "Host/Model/Project.h"
 #include "Host/Model/ProjectFile.h"
+#include "Host/Model/Sequence.h"
+#include "Host/Model/Track.h"
+#include "Host/Model/TrackItem.h"
 #include "Host/Shell/Application.h"
 #include "Host/Shell/AutomationScript.h"
+#include "Host/Shell/MonkeyScript.h"
 #include "Host/Shell/ProgramOptions.h"
 #include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ScriptRunner.h"
@@ -59,6 +64,39 @@ ProjectRef OpenDemoProject(std::string& error) {
   return loaded.project;
 }
 
+std::vector<std::int64_t> TrackItemIds(const Project& project) {
+  std::vector<std::int64_t> ids;
+  for (const auto& sequence : project.GetSequences()) {
+    for (const auto* tracks : {&sequence->GetVideoTracks(), &sequence->GetAudioTracks()}) {
+      for (const auto& track : *tracks) {
+        for (const auto& item : track->GetItems())
+          ids.push_back(item->GetID());
+      }
+    }
+  }
+  return ids;
+}
+
+// The monkey's script, kept under the output folder so that a failure can be run again with
+// --script. Returns the script's path, or empty with `error` set.
+std::string WriteMonkeyScript(const ProgramOptions& options, const Project& project,
+                              std::string& error) {
+  MonkeyOptions monkey;
+  monkey.seed = *options.monkeySeed;
+  monkey.events = options.monkeyEvents;
+  monkey.panelSize = options.size;
+  monkey.trackItemIds = TrackItemIds(project);
+  const std::filesystem::path path = std::filesystem::path(options.outDir) / "monkey.ecs";
+  std::error_code ec;
+  std::filesystem::create_directories(path.parent_path(), ec);
+  std::ofstream out(path, std::ios::binary | std::ios::trunc);
+  out << MonkeyScript::Generate(monkey);
+  out.close();
+  if (!out)
+    error = "cannot write the monkey's script " + path.string();
+  return out ? path.string() : std::string();
+}
+
 // A file that does not exist yet, in a folder that does, is a new, empty project that saves
 // there.
 ProjectRef OpenProjectFile(const std::string& path, std::string& error) {
@@ -97,22 +135,28 @@ int ReportRun(const ScriptRunResult& result, const std::string& scriptPath) {
 }
 
 int Run(const ProgramOptions& options) {
-  std::optional<AutomationScript> script;
-  if (!options.scriptPath.empty()) {
-    auto parsed = AutomationScript::ParseFile(options.scriptPath);
-    if (const auto* error = std::get_if<ScriptError>(&parsed)) {
-      // A script that does not parse changes nothing: report it before anything opens.
-      return Fail(error->line > 0 ? kExitScriptFailed : kExitCannotStart,
-                  options.scriptPath + ": " + error->Describe());
-    }
-    script = std::get<AutomationScript>(std::move(parsed));
-  }
   // The project is read before anything opens; the file is never written except by `save`.
   std::string error;
   ProjectRef project = options.projectPath.empty() ? OpenDemoProject(error)
                                                    : OpenProjectFile(options.projectPath, error);
   if (project == nullptr)
     return Fail(kExitCannotStart, error);
+  std::string scriptPath = options.scriptPath;
+  if (options.monkeySeed) {
+    scriptPath = WriteMonkeyScript(options, *project, error);
+    if (scriptPath.empty())
+      return Fail(kExitCannotStart, error);
+  }
+  std::optional<AutomationScript> script;
+  if (!scriptPath.empty()) {
+    auto parsed = AutomationScript::ParseFile(scriptPath);
+    if (const auto* failure = std::get_if<ScriptError>(&parsed)) {
+      // A script that does not parse changes nothing: report it before anything opens.
+      return Fail(failure->line > 0 ? kExitScriptFailed : kExitCannotStart,
+                  scriptPath + ": " + failure->Describe());
+    }
+    script = std::get<AutomationScript>(std::move(parsed));
+  }
 
   options.ApplyPreferences(Preferences::Application().Properties());
   Application application(options.size);
@@ -158,7 +202,7 @@ int Run(const ProgramOptions& options) {
       AllowSaving(runner);
       // Shots show what the window shows.
       runner.SetShotSource([&window] { return window->ReadBack(); });
-      exitCode = ReportRun(runner.Run(*script), options.scriptPath);
+      exitCode = ReportRun(runner.Run(*script), scriptPath);
     }
     window->RequestClose();
     while (window->Pump(0)) {
@@ -170,7 +214,7 @@ int Run(const ProgramOptions& options) {
   ScriptRunner runner(application, input, options.outDir);
   AllowSaving(runner);
   if (script)
-    return ReportRun(runner.Run(*script), options.scriptPath);
+    return ReportRun(runner.Run(*script), scriptPath);
   // Headless without a script: one frame of the workspace.
   const auto frame = AutomationScript::Parse("shot effectcontrols.png");
   return ReportRun(runner.Run(std::get<AutomationScript>(frame)), {});

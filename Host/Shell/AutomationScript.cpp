@@ -42,6 +42,7 @@ const std::map<std::string, VerbInfo, std::less<>>& VerbTable() {
       {"tool", {ScriptVerb::kTool, false}},
       {"open", {ScriptVerb::kOpen, false}},
       {"reopen-panel", {ScriptVerb::kReopenPanel, false}},
+      {"check", {ScriptVerb::kCheck, false}},
   };
   return table;
 }
@@ -120,6 +121,7 @@ class LineParser {
       case ScriptVerb::kUndo:
       case ScriptVerb::kRedo:
       case ScriptVerb::kClose:
+      case ScriptVerb::kCheck:
         return ExpectNoArguments();
       case ScriptVerb::kTime:
         return ParseTime();
@@ -140,8 +142,9 @@ class LineParser {
       case ScriptVerb::kKey:
         return ParseKey();
       case ScriptVerb::kCommand:
-      case ScriptVerb::kMenuAnswer:
         return ParseSingleWord();
+      case ScriptVerb::kMenuAnswer:
+        return ParseMenuAnswer();
       case ScriptVerb::kType:
       case ScriptVerb::kInputAnswer:
         mCommand.text = std::string(restOfLine);
@@ -282,6 +285,21 @@ class LineParser {
       return Needs("one argument");
     mCommand.text = std::string(mArgs[0]);
     return {};
+  }
+
+  // An id, a name, "none", or "pick N": the popup's N-th enabled command, counting round.
+  std::string ParseMenuAnswer() {
+    if (mArgs.size() == 2 && mArgs[0] == "pick") {
+      const auto index = ParseNumber<int>(mArgs[1]);
+      if (!index || *index < 0)
+        return "pick needs an index from 0 up, not '" + std::string(mArgs[1]) + "'";
+      mCommand.text = "pick";
+      mCommand.numbers.push_back(*index);
+      return {};
+    }
+    if (mArgs.size() == 1 && mArgs[0] == "pick")
+      return "pick needs an index from 0 up";
+    return ParseSingleWord();
   }
 
   std::string ParsePath(std::string_view restOfLine) {

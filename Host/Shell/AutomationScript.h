@@ -37,6 +37,7 @@ enum class ScriptVerb {
   kTool,
   kOpen,
   kReopenPanel,
+  kCheck,
 };
 
 // Key modifier bits of the host's modifier word.
@@ -52,8 +53,9 @@ struct ScriptCommand {
   int steps = 1;                  // drag: pointer moves between press and release
   std::uint32_t modifiers = 0;    // kScriptShift | kScriptCtrl | kScriptAlt
   // time: ticks or "hh:mm:ss:ff" (resolved against the sequence's frame rate when run);
-  // key: key name; type/input-answer: text; command: id or name; menu-answer: id, name or
-  // "none"; shot/dump/save: file path; tool: the tool's name (HostTool.h).
+  // key: key name; type/input-answer: text; command: id or name; menu-answer: id, name,
+  // "none" or "pick" (numbers: the index); shot/dump/save: file path; tool: the tool's name
+  // (HostTool.h).
   std::string text;
 };
 

@@ -29,11 +29,22 @@ std::optional<Size> ParseSize(std::string_view text) {
   return Size{*width, *height};
 }
 
+template <class T>
+std::optional<T> ParseWhole(std::string_view text) {
+  T value{};
+  const auto* end = text.data() + text.size();
+  const auto [ptr, ec] = std::from_chars(text.data(), end, value);
+  if (ec != std::errc() || ptr != end)
+    return std::nullopt;
+  return value;
+}
+
 }  // namespace
 
 ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_view> arguments) {
   ProgramOptions options;
-  bool sawProject = false, sawSize = false, sawScript = false, sawOut = false;
+  bool sawProject = false, sawSize = false, sawScript = false, sawOut = false, sawMonkey = false,
+       sawEvents = false;
   for (std::size_t i = 0; i < arguments.size(); ++i) {
     std::string_view name = arguments[i];
     std::optional<std::string_view> inlineValue;
@@ -64,6 +75,8 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
                  : name == "--size"   ? &sawSize
                  : name == "--script" ? &sawScript
                  : name == "--out"    ? &sawOut
+                 : name == "--monkey" ? &sawMonkey
+                 : name == "--events" ? &sawEvents
                                       : nullptr;
     if (seen == nullptr)
       return "unknown option '" + std::string(arguments[i]) + "'";
@@ -91,10 +104,23 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
       options.projectPath = value;
     } else if (name == "--script") {
       options.scriptPath = value;
+    } else if (name == "--monkey") {
+      options.monkeySeed = ParseWhole<std::uint64_t>(value);
+      if (!options.monkeySeed)
+        return "--monkey needs a seed (a whole number), not '" + std::string(value) + "'";
+    } else if (name == "--events") {
+      const auto events = ParseWhole<int>(value);
+      if (!events || *events < 1)
+        return "--events needs a count from 1 up, not '" + std::string(value) + "'";
+      options.monkeyEvents = *events;
     } else {
       options.outDir = value;
     }
   }
+  if (sawMonkey && sawScript)
+    return "--monkey and --script cannot go together: the monkey writes its own script";
+  if (sawEvents && !sawMonkey)
+    return "--events counts a monkey's events: give --monkey SEED too";
   return options;
 }
 
@@ -109,14 +135,19 @@ std::string ProgramOptions::Usage() {
          "  --headless      never open a window, even with a display\n"
          "  --pref KEY=VALUE  set a preference before the panels open (true/false, a number or\n"
          "                  text), e.g. effect.controls.own.slider.rows=true for slider rows\n"
+         "  --monkey SEED   random user input from SEED instead of a script, with a check every\n"
+         "                  100 events; the script it ran is written under --out as monkey.ecs\n"
+         "  --events N      how many events the monkey makes (default 3000)\n"
          "Script lines (one a line, '#' comments; coordinates are panel pixels):\n"
          "  select ID... | select-none | time TICKS|hh:mm:ss:ff\n"
          "  click|rclick|dblclick X Y [shift] [ctrl] [alt] | drag X1 Y1 X2 Y2 [steps N] [mods]\n"
          "  move X Y | wheel DY | key NAME [mods] | type TEXT\n"
-         "  command ID-or-NAME | menu-answer ID-or-NAME|none | input-answer TEXT\n"
+         "  command ID-or-NAME | menu-answer ID-or-NAME|none|pick N | input-answer TEXT\n"
          "  resize W H | undo | redo | shot FILE.png | dump FILE.json | save FILE (a copy)\n"
          "  close (as the window's close button: asks to save changes; ends the script)\n"
          "  wait MS (real time passes: playback runs) | memory FILE.json (resident size)\n"
+         "  check (saves, reloads, undoes and redoes all since the last check; fails on a\n"
+         "        difference or a debug assertion)\n"
          "What a user does outside the panel:\n"
          "  tool NAME       pick a timeline tool (pointer, track-select-forward, ripple, roll,\n"
          "                  rate-stretch, razor, slip, slide, pen, hand, zoom)\n"

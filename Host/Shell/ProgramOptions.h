@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstdint>
+#include <optional>
 #include <span>
 #include <string>
 #include <string_view>
@@ -13,7 +15,7 @@ class PropertyList;
 
 // The program's command line:
 //   effectcontrols [--project FILE] [--size WxH] [--script FILE] [--out DIR] [--headless]
-//                  [--pref KEY=VALUE]...
+//                  [--pref KEY=VALUE]... [--monkey SEED [--events N]]
 // Each option also takes the "--option=value" form. Parsing never touches the file system.
 struct ProgramOptions {
   static constexpr Size kDefaultSize{960, 540};
@@ -24,6 +26,10 @@ struct ProgramOptions {
   std::string outDir = ".";
   bool headless = false;
   bool help = false;
+  // A random session instead of a script: the seed of its input and how many events it makes.
+  std::optional<std::uint64_t> monkeySeed;
+  int monkeyEvents = kDefaultMonkeyEvents;
+  static constexpr int kDefaultMonkeyEvents = 3000;
   // Application preferences set before the panels open, in the order given (a later one wins):
   // key and value text ("true"/"false" a flag, a whole number, else text; see PreferenceValue).
   std::vector<std::pair<std::string, std::string>> preferences;

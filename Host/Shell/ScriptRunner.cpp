@@ -12,6 +12,7 @@
 #include <thread>
 #include <utility>
 
+#include "Host/Messaging/Diagnostics.h"
 #include "Host/Messaging/MessageLoop.h"
 #include "Host/Model/Project.h"
 #include "Host/Model/Sequence.h"
@@ -93,6 +94,12 @@ std::string ScriptRunner::ResolvePath(const std::string& name) const {
 
 ScriptRunResult ScriptRunner::Run(const AutomationScript& script) {
   ScriptRunResult result;
+  const auto& commands = script.Commands();
+  const bool checks = std::any_of(commands.begin(), commands.end(), [](const ScriptCommand& c) {
+    return c.verb == ScriptVerb::kCheck;
+  });
+  if (checks && mApplication.GetProject() != nullptr)
+    mHistoryCheck.Start(mApplication.GetProject());
   for (const ScriptCommand& command : script.Commands()) {
     std::string error;
     try {
@@ -187,6 +194,8 @@ std::string ScriptRunner::Execute(const ScriptCommand& command, ScriptRunResult&
       return RunOpen(command);
     case ScriptVerb::kReopenPanel:
       return RunReopenPanel();
+    case ScriptVerb::kCheck:
+      return RunCheck();
   }
   return "unknown verb";
 }
@@ -344,6 +353,11 @@ std::string ScriptRunner::RunCommand(const ScriptCommand& command, ScriptRunResu
 }
 
 std::string ScriptRunner::RunMenuAnswer(const ScriptCommand& command) {
+  if (command.text == "pick" && command.numbers.size() == 1) {
+    mMenus->PushPick(command.numbers.front());
+    mPendingMenuAnswers.push_back(std::nullopt);  // whatever it picks is enabled
+    return {};
+  }
   std::optional<CommandID> answer;
   if (command.text != "none") {
     std::string error;
@@ -440,6 +454,25 @@ std::string ScriptRunner::RunSave(const ScriptCommand& command, ScriptRunResult&
     return "cannot save '" + path + "': " + (error.empty() ? "unknown error" : error);
   result.written.push_back(path);
   return {};
+}
+
+std::string ScriptRunner::RunCheck() {
+  if (const auto& assertions = RecordedDebugAssertions(); !assertions.empty()) {
+    const DebugAssertionRecord& first = assertions.front();
+    return "a debug assertion fired: " + first.message + " (" + first.condition + ") in " +
+           first.function;
+  }
+  const ProjectRef& project = mApplication.GetProject();
+  if (project == nullptr)
+    return "no project is open";
+  // A project opened since the last check is checked from here on.
+  if (!mHistoryCheck.IsChecking(project)) {
+    mHistoryCheck.Start(project);
+    return {};
+  }
+  std::string error = mHistoryCheck.Check();
+  Settle();
+  return error;
 }
 
 std::string ScriptRunner::RunMemory(const ScriptCommand& command, ScriptRunResult& result) {

@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "Host/Shell/AutomationScript.h"
+#include "Host/Shell/HistoryCheck.h"
 #include "Host/Toolkit/CommandStatus.h"
 #include "Host/Toolkit/Geometry.h"
 
@@ -88,6 +89,9 @@ class ScriptRunner {
   std::string RunClose(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunDump(const ScriptCommand& command, ScriptRunResult& result);
   std::string RunSave(const ScriptCommand& command, ScriptRunResult& result);
+  // Saves, reloads and walks the undo history back and forth (see HistoryCheck); also fails on
+  // any debug assertion recorded so far.
+  std::string RunCheck();
   std::string WriteFile(const std::string& path, const std::string& content);
   // The command named by an id or a "cmd...." name, or an error.
   std::optional<CommandID> LookUpCommand(const std::string& text, std::string& error) const;
@@ -108,4 +112,5 @@ class ScriptRunner {
   std::shared_ptr<InputBoxResponder> mPreviousInputBoxes;
   std::deque<std::optional<CommandID>> mPendingMenuAnswers;  // mirrors the tracker's queue
   std::size_t mPopupsSeen = 0;
+  HistoryCheck mHistoryCheck;
 };

@@ -104,6 +104,19 @@ TEST(AutomationScript, WaitCloseAndMemoryTakeTheirArgumentsOrRefuseThem) {
   EXPECT_EQ(Error(AutomationScript::Parse("close now")).message, "close takes no arguments");
 }
 
+TEST(AutomationScript, MenuPicksAndChecksTakeTheirArgumentsOrRefuseThem) {
+  const auto script = Ok(AutomationScript::Parse("menu-answer pick 7\ncheck # between steps\n"));
+  ASSERT_EQ(script.Commands().size(), 2u);
+  EXPECT_EQ(script.Commands()[0].text, "pick");
+  EXPECT_EQ(script.Commands()[0].numbers, std::vector<int>{7});
+  EXPECT_EQ(script.Commands()[1].verb, ScriptVerb::kCheck);
+  EXPECT_EQ(Error(AutomationScript::Parse("menu-answer pick -1")).message,
+            "pick needs an index from 0 up, not '-1'");
+  EXPECT_EQ(Error(AutomationScript::Parse("menu-answer pick")).message,
+            "pick needs an index from 0 up");
+  EXPECT_EQ(Error(AutomationScript::Parse("check 3")).message, "check takes no arguments");
+}
+
 TEST(AutomationScript, ParsesWhatAUserDoesOutsideThePanel) {
   const auto parsed = AutomationScript::Parse("tool rate-stretch\nopen 21 43\nreopen-panel\n");
   ASSERT_TRUE(std::holds_alternative<AutomationScript>(parsed));

@@ -76,6 +76,23 @@ TEST(ProgramOptions, NamesTheOffendingArgument) {
   EXPECT_EQ(ErrorOf(ParseArgs({"stray.json"})), "unknown option 'stray.json'");
 }
 
+TEST(ProgramOptions, AMonkeyTakesASeedAndACountButNoScript) {
+  const auto options =
+      std::get<ProgramOptions>(ParseArgs({"--monkey", "18446744073709551615", "--events=12"}));
+  EXPECT_EQ(options.monkeySeed, std::optional<std::uint64_t>(18446744073709551615ULL));
+  EXPECT_EQ(options.monkeyEvents, 12);
+  EXPECT_EQ(std::get<ProgramOptions>(ParseArgs({"--monkey", "3"})).monkeyEvents,
+            ProgramOptions::kDefaultMonkeyEvents);
+  EXPECT_EQ(ErrorOf(ParseArgs({"--monkey", "x"})),
+            "--monkey needs a seed (a whole number), not 'x'");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--monkey", "1", "--events", "0"})),
+            "--events needs a count from 1 up, not '0'");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--events", "5"})),
+            "--events counts a monkey's events: give --monkey SEED too");
+  EXPECT_EQ(ErrorOf(ParseArgs({"--monkey", "1", "--script", "s.ecs"})),
+            "--monkey and --script cannot go together: the monkey writes its own script");
+}
+
 TEST(ProgramOptions, HelpIsRecognised) {
   EXPECT_TRUE(std::get<ProgramOptions>(ParseArgs({"--help"})).help);
   EXPECT_NE(ProgramOptions::Usage().find("--headless"), std::string::npos);

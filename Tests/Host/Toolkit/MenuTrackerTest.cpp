@@ -93,6 +93,21 @@ TEST_F(MenuTrackerTest, AnAnswerThatIsNoEnabledItemIsRefused) {
   EXPECT_EQ(RecordedDebugAssertions()[0].count, 2);
 }
 
+TEST_F(MenuTrackerTest, APickChoosesAmongTheEnabledCommandsCountingRound) {
+  // Enabled, in the order shown: Copy (57634), then Snap (18006) in the submenu; Rename is not.
+  tracker->PushPick(0);
+  tracker->PushPick(1);
+  tracker->PushPick(2);
+  EXPECT_EQ(list->TrackPopupMenu("Edit", Point{}), std::optional<CommandID>(57634));
+  EXPECT_EQ(list->TrackPopupMenu("Edit", Point{}), std::optional<CommandID>(18006));
+  EXPECT_EQ(list->TrackPopupMenu("Edit", Point{}), std::optional<CommandID>(57634));
+  list->statuses[57634].enabled = false;
+  list->statuses[18006].enabled = false;
+  tracker->PushPick(5);
+  EXPECT_EQ(list->TrackPopupMenu("Edit", Point{}), std::nullopt);
+  EXPECT_EQ(tracker->PendingAnswers(), 0u);
+}
+
 TEST_F(MenuTrackerTest, AnUnknownMenuOrNoTrackerShowsNothing) {
   ClearRecordedDebugAssertions();
   tracker->PushAnswer(57634);

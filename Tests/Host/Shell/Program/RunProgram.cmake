@@ -11,7 +11,8 @@ cmake_minimum_required(VERSION 3.25)
 file(REMOVE_RECURSE "${OUT}")
 file(MAKE_DIRECTORY "${OUT}")
 string(REPLACE "<out>" "${OUT}" args "${ARGS}")
-execute_process(COMMAND "${PROGRAM}" ${args}
+# In the output folder: anything the program writes where it runs stays with the test.
+execute_process(COMMAND "${PROGRAM}" ${args} WORKING_DIRECTORY "${OUT}"
                 RESULT_VARIABLE exit_code OUTPUT_VARIABLE out ERROR_VARIABLE err)
 message(STATUS "exit ${exit_code}\nstdout:\n${out}\nstderr:\n${err}")
 if(NOT exit_code STREQUAL EXPECT_EXIT)
