@@ -166,9 +166,12 @@ int Run(const ProgramOptions& options) {
   application.SetFailureReporter(
       [](const std::string& message) { std::cerr << "effectcontrols: " << message << "\n"; });
   application.OpenAllWindows();
+  const bool windowed = !options.headless && HasDisplay();
+  application.SetEditingLayout(
+      options.layout == ProgramOptions::Layout::kEditing ||
+      (options.layout == ProgramOptions::Layout::kDefault && windowed && !script));
   Settle(application);
 
-  const bool windowed = !options.headless && HasDisplay();
   if (windowed) {
     const auto window =
         SdlWindow::Open(application.GetViewHost(), WindowTitle(application), &error);

@@ -14,8 +14,10 @@
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Handler.h"
 #include "Host/Shell/Module.h"
+#include "Host/Shell/ProgramMonitorView.h"
 #include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ShellMessages.h"
+#include "Host/Shell/TimelineView.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/InputBox.h"
 #include "Host/Toolkit/StandardCommands.h"
@@ -290,6 +292,17 @@ ViewBase* Application::GetParentForNewViews() {
 
 void Application::SetWorkspaceMaximized(bool maximized) {
   mFrame->SetMaximized(maximized);
+}
+
+void Application::SetEditingLayout(bool editing) {
+  if (editing == mFrame->HasEditingViews())
+    return;
+  if (!editing) {
+    mFrame->SetEditingViews(nullptr, nullptr);
+    return;
+  }
+  mFrame->SetEditingViews(std::make_shared<ProgramMonitorView>(*this),
+                          std::make_shared<TimelineView>(*this));
 }
 
 TabView* Application::OpenTab(std::string_view handlerID) {

@@ -95,6 +95,9 @@ class Application {
   // The view new panel views hang under (their parent and super commander): the frame.
   ViewBase* GetParentForNewViews();
   void SetWorkspaceMaximized(bool maximized);
+  // A timeline and a program monitor beside the tabs (see WorkspaceFrame::SetEditingViews), or
+  // the tabs alone.
+  void SetEditingLayout(bool editing);
   // Asks the handler for its tab (with the tab's saved state), brings it to the front and
   // focuses it. A single-instance handler's open tab is closed first (its state saved).
   TabView* OpenTab(std::string_view handlerID);

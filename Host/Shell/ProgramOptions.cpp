@@ -44,7 +44,7 @@ std::optional<T> ParseWhole(std::string_view text) {
 ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_view> arguments) {
   ProgramOptions options;
   bool sawProject = false, sawSize = false, sawScript = false, sawOut = false, sawMonkey = false,
-       sawEvents = false;
+       sawEvents = false, sawLayout = false;
   for (std::size_t i = 0; i < arguments.size(); ++i) {
     std::string_view name = arguments[i];
     std::optional<std::string_view> inlineValue;
@@ -77,6 +77,7 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
                  : name == "--out"    ? &sawOut
                  : name == "--monkey" ? &sawMonkey
                  : name == "--events" ? &sawEvents
+                 : name == "--layout" ? &sawLayout
                                       : nullptr;
     if (seen == nullptr)
       return "unknown option '" + std::string(arguments[i]) + "'";
@@ -104,6 +105,10 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
       options.projectPath = value;
     } else if (name == "--script") {
       options.scriptPath = value;
+    } else if (name == "--layout") {
+      if (value != "editing" && value != "panel")
+        return "--layout is editing or panel, not '" + std::string(value) + "'";
+      options.layout = value == "editing" ? Layout::kEditing : Layout::kPanel;
     } else if (name == "--monkey") {
       options.monkeySeed = ParseWhole<std::uint64_t>(value);
       if (!options.monkeySeed)
@@ -126,13 +131,16 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
 
 std::string ProgramOptions::Usage() {
   return "usage: effectcontrols [--project FILE] [--size WxH] [--script FILE] [--out DIR] "
-         "[--headless] [--pref KEY=VALUE]...\n"
+         "[--headless] [--layout editing|panel] [--pref KEY=VALUE]... [--monkey SEED [--events "
+         "N]]\n"
          "  --project FILE  project to open and save with Ctrl+S; a new one when FILE does not\n"
          "                  exist yet (default: the built-in demo project, saved where asked)\n"
          "  --size WxH      workspace (window) size in pixels (default 960x540)\n"
          "  --script FILE   automation script to run; shots and dumps go under --out\n"
          "  --out DIR       folder for shots, dumps and saves (default: the current folder)\n"
          "  --headless      never open a window, even with a display\n"
+         "  --layout L      editing: a timeline and a program monitor beside the panel (the\n"
+         "                  default in a window without a script); panel: the panel alone\n"
          "  --pref KEY=VALUE  set a preference before the panels open (true/false, a number or\n"
          "                  text), e.g. effect.controls.own.slider.rows=true for slider rows\n"
          "  --monkey SEED   random user input from SEED instead of a script, with a check every\n"

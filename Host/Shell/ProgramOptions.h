@@ -15,7 +15,7 @@ class PropertyList;
 
 // The program's command line:
 //   effectcontrols [--project FILE] [--size WxH] [--script FILE] [--out DIR] [--headless]
-//                  [--pref KEY=VALUE]... [--monkey SEED [--events N]]
+//                  [--layout editing|panel] [--pref KEY=VALUE]... [--monkey SEED [--events N]]
 // Each option also takes the "--option=value" form. Parsing never touches the file system.
 struct ProgramOptions {
   static constexpr Size kDefaultSize{960, 540};
@@ -26,6 +26,10 @@ struct ProgramOptions {
   std::string outDir = ".";
   bool headless = false;
   bool help = false;
+  // The workspace: a timeline and a program monitor beside the panel ("editing"), or the panel
+  // alone ("panel"). Unset: editing in a window without a script, else the panel alone.
+  enum class Layout { kDefault, kEditing, kPanel };
+  Layout layout = Layout::kDefault;
   // A random session instead of a script: the seed of its input and how many events it makes.
   std::optional<std::uint64_t> monkeySeed;
   int monkeyEvents = kDefaultMonkeyEvents;

@@ -10,8 +10,10 @@
 #include "Host/Model/TrackItem.h"
 #include "Host/Model/UndoStack.h"
 #include "Host/Shell/Application.h"
+#include "Host/Shell/ProgramMonitorView.h"
 #include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/StateDumpSource.h"
+#include "Host/Shell/TimelineView.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/Cursor.h"
 #include "Host/Toolkit/TabView.h"
@@ -23,6 +25,46 @@ using nlohmann::ordered_json;
 
 ordered_json RectJSON(const StateDumpRect& rect) {
   return {{"x", rect.x}, {"y", rect.y}, {"width", rect.width}, {"height", rect.height}};
+}
+
+// A rectangle of `view` in script coordinates: relative to the front tab, as clicks are given.
+ordered_json ScriptRectJSON(const WorkspaceFrame& frame, const ViewBase& view, const Rect& rect) {
+  const Point origin = frame.GetTabArea().TopLeft();
+  const Point topLeft = view.LocalToWindow(rect.TopLeft());
+  const TabView* front = frame.GetFrontTab();
+  const Point panel = front != nullptr ? front->WindowToLocal(topLeft) : topLeft - origin;
+  return RectJSON({panel.x, panel.y, rect.Width(), rect.Height()});
+}
+
+// A rectangle of `view` in window coordinates, as shots show it.
+ordered_json WindowRectJSON(const ViewBase& view, const Rect& rect) {
+  const Point topLeft = view.LocalToWindow(rect.TopLeft());
+  return RectJSON({topLeft.x, topLeft.y, rect.Width(), rect.Height()});
+}
+
+// The timeline and the monitor, when the workspace shows them.
+ordered_json EditingViewsJSON(const WorkspaceFrame& frame) {
+  const auto* timeline = dynamic_cast<const TimelineView*>(frame.GetTimelineView());
+  const auto* monitor = dynamic_cast<const ProgramMonitorView*>(frame.GetMonitorView());
+  if (timeline == nullptr || monitor == nullptr)
+    return ordered_json();
+  ordered_json items = ordered_json::array();
+  for (const TimelineView::ItemPlace& place : timeline->GetItemPlaces()) {
+    items.push_back({{"id", place.item->GetID()},
+                     {"name", place.item->GetName()},
+                     {"rect", ScriptRectJSON(frame, *timeline, place.rect)}});
+  }
+  const Rect timelineBounds{0, 0, timeline->GetSize().width, timeline->GetSize().height};
+  const Rect ruler{TimelineView::kHeaderWidth, 0, timelineBounds.right, TimelineView::kRulerHeight};
+  const Rect monitorBounds{0, 0, monitor->GetSize().width, monitor->GetSize().height};
+  return {{"timeline",
+           {{"rect", ScriptRectJSON(frame, *timeline, timelineBounds)},
+            {"ruler", ScriptRectJSON(frame, *timeline, ruler)},
+            {"items", std::move(items)}}},
+          {"monitor",
+           {{"rect", ScriptRectJSON(frame, *monitor, monitorBounds)},
+            {"frame", ScriptRectJSON(frame, *monitor, monitor->GetFrameRect())},
+            {"frameInWindow", WindowRectJSON(*monitor, monitor->GetFrameRect())}}}};
 }
 
 ordered_json RowJSON(const StateDumpRow& row) {
@@ -141,6 +183,11 @@ std::string StateDumpWriter::Write(Application& application) {
     tabs.push_back({{"handler", tab->GetHandlerID()}, {"name", tab->GetTabName()}});
   workspace["tabs"] = std::move(tabs);
   workspace["cursor"] = std::string(CursorName(GetCurrentCursor()));
+  // Only in the editing layout, so that dumps of the panel alone stay as they were.
+  if (ordered_json editing = EditingViewsJSON(frame); !editing.is_null()) {
+    workspace["timeline"] = std::move(editing["timeline"]);
+    workspace["monitor"] = std::move(editing["monitor"]);
+  }
   root["workspace"] = std::move(workspace);
 
   const SequenceRef sequence = application.GetActiveSequence();

@@ -23,6 +23,10 @@ constexpr int kMaxLabelWidth = 220;
 constexpr int kFlyoutButtonWidth = 22;
 constexpr Color kFlyoutGlyphColor(190, 190, 190);
 constexpr int kFileMenuButtonWidth = 44;
+// The editing layout's split: the panel's share of the width, the timeline's of the height.
+constexpr int kPanelWidthPercent = 50;
+constexpr int kTimelineHeightPercent = 38;
+constexpr int kGap = 2;
 
 constexpr std::string_view kFileMenuText = R"(
 menu Workspace_File_Menu
@@ -125,7 +129,42 @@ Rect WorkspaceFrame::GetTabLabelRect(std::size_t index) const {
 
 Rect WorkspaceFrame::GetTabArea() const {
   const Size size = GetSize();
-  return {0, std::min(kTabStripHeight, size.height), size.width, size.height};
+  const int top = std::min(kTabStripHeight, size.height);
+  if (!HasEditingViews())
+    return {0, top, size.width, size.height};
+  return {0, top, size.width * kPanelWidthPercent / 100, GetTimelineArea().top};
+}
+
+Rect WorkspaceFrame::GetMonitorArea() const {
+  if (!HasEditingViews())
+    return {};
+  const Rect tabs = GetTabArea();
+  return {std::min(tabs.right + kGap, GetSize().width), tabs.top, GetSize().width, tabs.bottom};
+}
+
+Rect WorkspaceFrame::GetTimelineArea() const {
+  if (!HasEditingViews())
+    return {};
+  const Size size = GetSize();
+  const int top = std::min(kTabStripHeight, size.height);
+  const int height = std::max(0, size.height - top) * kTimelineHeightPercent / 100;
+  return {0, std::max(top, size.height - height), size.width, size.height};
+}
+
+void WorkspaceFrame::SetEditingViews(std::shared_ptr<ViewBase> monitor,
+                                     std::shared_ptr<ViewBase> timeline) {
+  for (const auto& view : {mMonitor, mTimeline}) {
+    if (view != nullptr)
+      view->Destroy();
+  }
+  mMonitor = monitor != nullptr && timeline != nullptr ? std::move(monitor) : nullptr;
+  mTimeline = mMonitor != nullptr ? std::move(timeline) : nullptr;
+  if (mMonitor != nullptr) {
+    AddChild(mMonitor);
+    AddChild(mTimeline);
+  }
+  LayOutTabs();
+  Invalidate();
 }
 
 Rect WorkspaceFrame::GetFlyoutButtonRect() const {
@@ -235,4 +274,8 @@ void WorkspaceFrame::LayOutTabs() {
   const Rect area = GetTabArea();
   for (TabView* tab : GetTabs())
     tab->SetBounds(area);
+  if (HasEditingViews()) {
+    mMonitor->SetBounds(GetMonitorArea());
+    mTimeline->SetBounds(GetTimelineArea());
+  }
 }

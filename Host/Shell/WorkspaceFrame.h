@@ -47,6 +47,16 @@ class WorkspaceFrame : public SubView, public TabFrame {
   // The program's menu as the "File" button shows it.
   static const Menu& GetFileMenu();
 
+  // The editing layout: the tabs at the top left, `monitor` at the top right and `timeline`
+  // along the bottom, the frame owning both (children). Null for both: the tabs fill the frame.
+  void SetEditingViews(std::shared_ptr<ViewBase> monitor, std::shared_ptr<ViewBase> timeline);
+  bool HasEditingViews() const { return mMonitor != nullptr; }
+  ViewBase* GetMonitorView() const { return mMonitor.get(); }
+  ViewBase* GetTimelineView() const { return mTimeline.get(); }
+  // Their areas in frame coordinates (empty without the editing layout).
+  Rect GetMonitorArea() const;
+  Rect GetTimelineArea() const;
+
   // Forgets tabs that left the frame and shows another one when the front tab went.
   void TabsChanged();
 
@@ -58,6 +68,8 @@ class WorkspaceFrame : public SubView, public TabFrame {
   void Prune();
   void LayOutTabs();
 
+  std::shared_ptr<ViewBase> mMonitor;
+  std::shared_ptr<ViewBase> mTimeline;
   std::vector<std::weak_ptr<TabView>> mTabs;
   std::weak_ptr<TabView> mFront;
   bool mMaximized = false;

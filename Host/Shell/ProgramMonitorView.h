@@ -1,0 +1,33 @@
+#pragma once
+
+#include "Host/Messaging/Listener.h"
+#include "Host/Model/ModelRefs.h"
+#include "Host/Toolkit/SubView.h"
+
+class Application;
+
+// The workspace's program monitor: the active sequence's picture at the edit line, rendered by
+// the host's FrameRenderer. It follows the edit line (playback included), every edit (values,
+// keyframes, effects, undo) and the active sequence. Owned by the workspace frame (a child
+// view). UI thread only.
+class ProgramMonitorView : public SubView, public Listener {
+ public:
+  explicit ProgramMonitorView(Application& application);
+  ~ProgramMonitorView() override;
+
+  // Where the sequence's frame is drawn, in local coordinates (empty without a sequence).
+  Rect GetFrameRect() const;
+
+  void PaintSelf(DC& dc) override;
+  void SetBoundsSelf(const Rect& bounds) override;
+
+  // --- Listener ---
+  void ListenToMessage(const Message& message) override;
+
+ private:
+  // Listens to what the picture shows: the sequence, its player, the project's history and the
+  // effect chains of the clips drawn.
+  void ListenTo(const SequenceRef& sequence);
+
+  Application& mApplication;
+};
