@@ -1,11 +1,11 @@
 #include "Host/Shell/AutomationScript.h"
 
-#include <charconv>
 #include <fstream>
 #include <map>
 #include <sstream>
 
 #include "Host/Shell/HostTool.h"
+#include "Host/Shell/WholeNumber.h"
 
 namespace {
 
@@ -69,16 +69,6 @@ std::vector<std::string_view> SplitWords(std::string_view s) {
     i = j;
   }
   return words;
-}
-
-template <class T>
-std::optional<T> ParseNumber(std::string_view word) {
-  T value{};
-  const auto* end = word.data() + word.size();
-  const auto [ptr, ec] = std::from_chars(word.data(), end, value);
-  if (ec != std::errc() || ptr != end)
-    return std::nullopt;
-  return value;
 }
 
 std::optional<std::uint32_t> ParseModifier(std::string_view word) {
@@ -187,7 +177,7 @@ class LineParser {
                  : Needs("at least one track-item id (or use select-none)");
     }
     for (auto word : mArgs) {
-      auto id = ParseNumber<std::int64_t>(word);
+      auto id = ParseWholeNumber<std::int64_t>(word);
       if (!id || *id < 0)
         return "'" + std::string(word) + "' is not a track-item id";
       mCommand.ids.push_back(*id);
@@ -199,7 +189,7 @@ class LineParser {
     if (mArgs.size() != 1)
       return Needs("one time: ticks or hh:mm:ss:ff");
     const auto word = mArgs[0];
-    if (!ParseNumber<std::int64_t>(word) && !LooksLikeTimecode(word)) {
+    if (!ParseWholeNumber<std::int64_t>(word) && !LooksLikeTimecode(word)) {
       return "'" + std::string(word) + "' is neither a tick count nor a timecode hh:mm:ss:ff";
     }
     mCommand.text = std::string(word);
@@ -225,7 +215,7 @@ class LineParser {
     if (mArgs.size() < count)
       return Needs(what);
     for (std::size_t i = 0; i < count; ++i) {
-      auto value = ParseNumber<int>(mArgs[i]);
+      auto value = ParseWholeNumber<int>(mArgs[i]);
       if (!value)
         return "'" + std::string(mArgs[i]) + "' is not an integer (" + Needs(what) + ")";
       mCommand.numbers.push_back(*value);
@@ -241,7 +231,7 @@ class LineParser {
       if (allowSteps && mArgs[i] == "steps") {
         if (i + 1 >= mArgs.size())
           return "steps needs a count";
-        auto steps = ParseNumber<int>(mArgs[++i]);
+        auto steps = ParseWholeNumber<int>(mArgs[++i]);
         if (!steps || *steps < 1 || *steps > 10000)
           return "steps must be between 1 and 10000";
         mCommand.steps = *steps;
@@ -290,7 +280,7 @@ class LineParser {
   // An id, a name, "none", or "pick N": the popup's N-th enabled command, counting round.
   std::string ParseMenuAnswer() {
     if (mArgs.size() == 2 && mArgs[0] == "pick") {
-      const auto index = ParseNumber<int>(mArgs[1]);
+      const auto index = ParseWholeNumber<int>(mArgs[1]);
       if (!index || *index < 0)
         return "pick needs an index from 0 up, not '" + std::string(mArgs[1]) + "'";
       mCommand.text = "pick";

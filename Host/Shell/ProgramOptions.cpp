@@ -1,19 +1,17 @@
 #include "Host/Shell/ProgramOptions.h"
 
-#include <charconv>
 #include <optional>
 
 #include "Host/Messaging/PropertyList.h"
+#include "Host/Shell/WholeNumber.h"
 
 namespace {
 
 constexpr int kMaxSide = 16384;
 
 std::optional<int> ParseSide(std::string_view text) {
-  int value = 0;
-  const auto* end = text.data() + text.size();
-  const auto [ptr, ec] = std::from_chars(text.data(), end, value);
-  if (ec != std::errc() || ptr != end || value < 1 || value > kMaxSide)
+  const std::optional<int> value = ParseWholeNumber<int>(text);
+  if (!value || *value < 1 || *value > kMaxSide)
     return std::nullopt;
   return value;
 }
@@ -27,16 +25,6 @@ std::optional<Size> ParseSize(std::string_view text) {
   if (!width || !height)
     return std::nullopt;
   return Size{*width, *height};
-}
-
-template <class T>
-std::optional<T> ParseWhole(std::string_view text) {
-  T value{};
-  const auto* end = text.data() + text.size();
-  const auto [ptr, ec] = std::from_chars(text.data(), end, value);
-  if (ec != std::errc() || ptr != end)
-    return std::nullopt;
-  return value;
 }
 
 }  // namespace
@@ -110,11 +98,11 @@ ProgramOptions::ParseResult ProgramOptions::Parse(std::span<const std::string_vi
         return "--layout is editing or panel, not '" + std::string(value) + "'";
       options.layout = value == "editing" ? Layout::kEditing : Layout::kPanel;
     } else if (name == "--monkey") {
-      options.monkeySeed = ParseWhole<std::uint64_t>(value);
+      options.monkeySeed = ParseWholeNumber<std::uint64_t>(value);
       if (!options.monkeySeed)
         return "--monkey needs a seed (a whole number), not '" + std::string(value) + "'";
     } else if (name == "--events") {
-      const auto events = ParseWhole<int>(value);
+      const auto events = ParseWholeNumber<int>(value);
       if (!events || *events < 1)
         return "--events needs a count from 1 up, not '" + std::string(value) + "'";
       options.monkeyEvents = *events;
@@ -174,11 +162,8 @@ void ProgramOptions::ApplyPreferences(PropertyList& properties) const {
       properties.SetBool(key, text == "true");
       continue;
     }
-    int number = 0;
-    const char* end = text.data() + text.size();
-    const auto [ptr, ec] = std::from_chars(text.data(), end, number);
-    if (!text.empty() && ec == std::errc() && ptr == end) {
-      properties.SetInt(key, number);
+    if (const std::optional<int> number = ParseWholeNumber<int>(text)) {
+      properties.SetInt(key, *number);
     } else {
       properties.SetString(key, text);
     }

@@ -22,6 +22,7 @@
 #include "Host/Shell/ProjectDocument.h"
 #include "Host/Shell/ScriptInputRoute.h"
 #include "Host/Shell/StateDumpWriter.h"
+#include "Host/Shell/WholeNumber.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/Image.h"
 #include "Host/Toolkit/InputBox.h"
@@ -32,15 +33,6 @@
 #include "Host/Toolkit/ViewHost.h"
 
 namespace {
-
-std::optional<std::int64_t> ParseInteger(const std::string& text) {
-  std::int64_t value = 0;
-  const char* end = text.data() + text.size();
-  const auto [ptr, ec] = std::from_chars(text.data(), end, value);
-  if (ec != std::errc() || ptr != end || text.empty())
-    return std::nullopt;
-  return value;
-}
 
 bool IsEnabledCommandOf(const std::vector<PopupMenuEntry>& entries, CommandID command) {
   for (const auto& entry : entries) {
@@ -237,7 +229,7 @@ std::string ScriptRunner::RunTime(const ScriptCommand& command) {
   if (sequence == nullptr)
     return "there is no active sequence to move the edit line of";
   TickTime time = 0;
-  if (const auto ticks = ParseInteger(command.text)) {
+  if (const auto ticks = ParseWholeNumber<std::int64_t>(command.text)) {
     time = *ticks;
   } else {
     const FrameRate& display = sequence->GetVideoTimeDisplay();
@@ -321,7 +313,7 @@ std::string ScriptRunner::RunKey(const ScriptCommand& command) {
 
 std::optional<CommandID> ScriptRunner::LookUpCommand(const std::string& text,
                                                      std::string& error) const {
-  if (const auto number = ParseInteger(text)) {
+  if (const auto number = ParseWholeNumber<std::int64_t>(text)) {
     if (*number <= 0 || *number > std::numeric_limits<CommandID>::max()) {
       error = "'" + text + "' is not a command id";
       return std::nullopt;
