@@ -130,10 +130,11 @@ class Generator {
   }
 
   // A point in the panel, now and then a little outside it; more than half of them in the
-  // list at its left, where the controls are.
+  // list at its left, where the controls are, some on the stopwatches.
   std::string Point() {
-    const int x =
-        Chance(55) ? Below(std::min(mSize.width, kListWidth)) : Below(mSize.width + 40) - 20;
+    const int x = Chance(10)   ? kStopwatchColumn + Below(12)
+                  : Chance(55) ? Below(std::min(mSize.width, kListWidth))
+                               : Below(mSize.width + 40) - 20;
     const int y = Below(mSize.height + 40) - 20;
     return std::to_string(x) + " " + std::to_string(y);
   }
