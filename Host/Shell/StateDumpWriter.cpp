@@ -14,6 +14,7 @@
 #include "Host/Shell/StateDumpSource.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/Cursor.h"
+#include "Host/Toolkit/PersistentToolTip.h"
 #include "Host/Toolkit/TabView.h"
 #include "Host/Toolkit/ViewHost.h"
 
@@ -141,6 +142,8 @@ std::string StateDumpWriter::Write(Application& application) {
     tabs.push_back({{"handler", tab->GetHandlerID()}, {"name", tab->GetTabName()}});
   workspace["tabs"] = std::move(tabs);
   workspace["cursor"] = std::string(CursorName(GetCurrentCursor()));
+  const PersistentToolTip* tip = application.GetViewHost().GetShownToolTip();
+  workspace["toolTip"] = tip != nullptr ? ordered_json(tip->GetText()) : ordered_json();
   root["workspace"] = std::move(workspace);
 
   const SequenceRef sequence = application.GetActiveSequence();
