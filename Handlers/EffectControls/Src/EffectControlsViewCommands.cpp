@@ -247,6 +247,10 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
   if (IsNavigationCommand(command)) {
     const bool target = mSequence != nullptr || GetMasterClip() != nullptr;
     status.enabled = target && (editable || !IsEditingCommand(command));
+    if (command == kEditMarkerCommand && status.enabled) {
+      mMarkers.SetMasterClip(GetMasterClip(), GetMasterClipItem());
+      status.enabled = mMarkers.FindAt(mTimeline->GetEditTime()).has_value();
+    }
     return true;
   }
   switch (command) {

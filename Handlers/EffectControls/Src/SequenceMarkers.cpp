@@ -125,6 +125,11 @@ bool SequenceMarkers::AddAt(TickTime time, int colorIndex) {
   if (Source() == nullptr) {
     return false;
   }
+  if (FindAt(time)) {
+    // A second marker on the same frame could not be seen, picked or stepped to on its own.
+    SelectAt(time);
+    return false;
+  }
   Marker marker;
   marker.time = ToOwner(time);
   marker.colorIndex = colorIndex;

@@ -52,6 +52,7 @@ class SequenceMarkers {
   std::optional<Marker> GetMarker(std::int64_t id) const;
 
   // Undoable edits; false when nothing changed (no sequence, read-only, nothing there).
+  // Where a marker already sits at `time` none is added: that one is selected instead.
   bool AddAt(TickTime time, int colorIndex);
   // Removes the selected markers lying exactly at `time`.
   bool RemoveSelectedAt(TickTime time);

@@ -245,6 +245,7 @@ TEST_F(PanelEditingTest, EditingTheMarkerAtTheEditLineIsOneStepAndUndoRestoresIt
   ASSERT_EQ(MarkerActions::AddMarker(sequence, marker), EditStatus::Done);
   sequence->SetCurrentTime(4 * kSec);
   MessageLoop::Instance().RunPending();
+  EXPECT_TRUE(Enabled(*view, View::kEditMarkerCommand));
   const std::size_t steps = Steps();
   {
     Answers answers;
@@ -283,10 +284,25 @@ TEST_F(PanelEditingTest, CancellingTheMarkerEditorOrHavingNoMarkerThereChangesNo
   sequence->SetCurrentTime(4 * kSec);
   view->ObeyCommand(View::kEditMarkerCommand);
   sequence->SetCurrentTime(5 * kSec);  // no marker here: no editor
+  EXPECT_FALSE(Enabled(*view, View::kEditMarkerCommand));
   view->ObeyCommand(View::kEditMarkerCommand);
   EXPECT_EQ(answers.Requests().size(), 2U);
   EXPECT_EQ(Steps(), steps);
   EXPECT_EQ(sequence->GetMarkers().At(0), marker);
+}
+
+TEST_F(PanelEditingTest, AddingAMarkerWhereOneSitsSelectsItInsteadOfStackingAHiddenCopy) {
+  sequence->SetCurrentTime(4 * kSec);
+  view->ObeyCommand(View::kAddMarkerCommand);
+  const std::size_t steps = Steps();
+  view->ObeyCommand(View::kAddMarkerCommand);
+  view->ObeyCommand(View::kFirstColoredMarkerCommand + 2);
+  EXPECT_EQ(sequence->GetMarkers().Size(), 1U);
+  EXPECT_EQ(Steps(), steps);
+  EXPECT_TRUE(view->GetMarkers().IsSelected(1));
+  sequence->SetCurrentTime(4 * kSec + kSec / 25);  // the next frame takes one
+  view->ObeyCommand(View::kAddMarkerCommand);
+  EXPECT_EQ(sequence->GetMarkers().Size(), 2U);
 }
 
 // --- Blend modes ---
