@@ -96,10 +96,14 @@ void Component::SetOffline(bool offline) {
 }
 
 void Component::SetPresets(std::vector<ComponentPreset> presets) {
+  if (presets == mPresets) {
+    return;
+  }
   mPresets = std::move(presets);
   if (mCurrentPreset >= static_cast<int>(mPresets.size())) {
     mCurrentPreset = -1;
   }
+  NotifyChanged();
 }
 
 bool Component::SetCurrentPreset(int index) {

@@ -2,9 +2,17 @@
 
 #include <algorithm>
 
+namespace {
+
+bool IsStorable(const Marker& marker) {
+  return IsStorableTime(marker.time) && marker.duration >= 0 &&
+         IsStorableTime(AddTimes(marker.time, marker.duration));
+}
+
+}  // namespace
+
 std::optional<std::size_t> Markers::Add(const Marker& marker) {
-  if (!IsStorableTime(marker.time) || marker.duration < 0 ||
-      !IsStorableTime(AddTimes(marker.time, marker.duration))) {
+  if (!IsStorable(marker)) {
     return std::nullopt;
   }
   auto it = std::upper_bound(mMarkers.begin(), mMarkers.end(), marker.time,
@@ -19,6 +27,24 @@ bool Markers::Remove(std::size_t index) {
   }
   mMarkers.erase(mMarkers.begin() + static_cast<std::ptrdiff_t>(index));
   return true;
+}
+
+bool Markers::InsertAt(std::size_t index, const Marker& marker) {
+  if (index > mMarkers.size() || !IsStorable(marker) ||
+      (index > 0 && mMarkers[index - 1].time > marker.time) ||
+      (index < mMarkers.size() && mMarkers[index].time < marker.time)) {
+    return false;
+  }
+  mMarkers.insert(mMarkers.begin() + static_cast<std::ptrdiff_t>(index), marker);
+  return true;
+}
+
+std::optional<std::size_t> Markers::Replace(std::size_t index, const Marker& marker) {
+  if (index >= mMarkers.size() || !IsStorable(marker)) {
+    return std::nullopt;
+  }
+  Remove(index);
+  return Add(marker);
 }
 
 std::size_t Markers::RemoveAt(TickTime time) {

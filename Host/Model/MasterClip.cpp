@@ -46,6 +46,12 @@ void MasterClip::SetOutPoint(std::optional<TickTime> time) {
   NotifyPropertiesChanged({kPropertyKey_OutPoint});
 }
 
+void MasterClip::ChangeMarkers(const std::function<bool(Markers&)>& change) {
+  if (change(mMarkers)) {
+    BroadcastMessage(GetStation(), MarkersChangedMessage(GetID()));
+  }
+}
+
 void MasterClip::SetMarkers(Markers markers) {
   if (markers == mMarkers) {
     return;

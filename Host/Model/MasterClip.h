@@ -1,5 +1,6 @@
 #pragma once
 
+#include <functional>
 #include <optional>
 #include <string>
 
@@ -36,6 +37,9 @@ class MasterClip : public ModelObject {
 
   const Markers& GetMarkers() const { return mMarkers; }
   void SetMarkers(Markers markers);  // MarkersChangedMessage
+  // Edits the markers in place; MarkersChangedMessage when `change` returns true (it changed
+  // something). Used by MarkerActions, whose steps keep only the marker they change.
+  void ChangeMarkers(const std::function<bool(Markers&)>& change);
 
   const ComponentChainRef& GetVideoChain() const { return mVideoChain; }
 

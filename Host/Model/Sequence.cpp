@@ -126,6 +126,12 @@ void Sequence::SetOutPoint(std::optional<TickTime> time) {
   BroadcastMessage(GetStation(), PropertiesChangedMessage(GetID(), {kPropertyKey_OutPoint}));
 }
 
+void Sequence::ChangeMarkers(const std::function<bool(Markers&)>& change) {
+  if (change(mMarkers)) {
+    BroadcastMessage(GetStation(), MarkersChangedMessage(GetID()));
+  }
+}
+
 void Sequence::SetMarkers(Markers markers) {
   if (markers == mMarkers) {
     return;

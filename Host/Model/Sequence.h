@@ -75,6 +75,9 @@ class Sequence : public ModelObject {
 
   const Markers& GetMarkers() const { return mMarkers; }
   void SetMarkers(Markers markers);  // MarkersChangedMessage
+  // Edits the markers in place; MarkersChangedMessage when `change` returns true (it changed
+  // something). Used by MarkerActions, whose steps keep only the marker they change.
+  void ChangeMarkers(const std::function<bool(Markers&)>& change);
 
   // The edit line. Moving it sends PlayerPositionChangedMessage on the player station.
   TickTime GetCurrentTime() const { return mCurrentTime; }

@@ -61,10 +61,17 @@ void EffectItem::FinishCreateSelf() {
   }
 }
 
+void EffectItem::CommitPendingInput() {
+  for (const std::shared_ptr<ViewBase>& control : GetControls()) {
+    control->CommitPendingInput();
+  }
+}
+
 void EffectItem::Destroy() {
   if (mDestroyed) {
     return;
   }
+  CommitPendingInput();
   mDestroyed = true;
   mShown = false;
   RemoveListenerFromAllStations(*this);

@@ -79,6 +79,9 @@ class EffectItem : public Listener, public std::enable_shared_from_this<EffectIt
   // The controls the row adopted into its parent view (AdoptControl) and has not destroyed, in
   // the order they were made. For inspection (state dumps); the row keeps owning them.
   std::vector<std::shared_ptr<ViewBase>> GetControls() const;
+  // Applies what the row's controls hold unconfirmed (typed text), as one undo step each; Destroy
+  // does it first, while the row still hears its controls.
+  virtual void CommitPendingInput();
 
   // --- Tree ---
   // Appends `child` (ignored when null, this row, or already someone's child). The child gets

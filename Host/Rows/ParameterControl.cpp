@@ -125,10 +125,26 @@ void ParameterControl::FinishCreateSelf() {
   mLastSynchTime = GetEditTime();
 }
 
+void ParameterControl::CommitPendingInput() {
+  EffectItem::CommitPendingInput();
+  ViewBase* parent = GetParentView();
+  if (parent == nullptr) {
+    return;
+  }
+  // A copy: applying a value may change the list's children.
+  const std::vector<std::shared_ptr<ViewBase>> children = parent->GetChildren();
+  for (const std::shared_ptr<ViewBase>& child : children) {
+    if (child->GetSuperCommander() == this) {
+      child->CommitPendingInput();
+    }
+  }
+}
+
 void ParameterControl::Destroy() {
   if (IsDestroyed()) {
     return;
   }
+  CommitPendingInput();
   ReleaseParamActor();
   StopListeningToBinding();
   DestroyControl(mStopwatch);

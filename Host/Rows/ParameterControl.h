@@ -97,6 +97,8 @@ class ParameterControl : public EffectItem, public Commander {
   // value (SynchToCurrentTime).
   void FinishCreateSelf() override;
   // Ends an open edit (committing a set value), stops listening, destroys the controls.
+  // Also the value fields the parameter cache lends the row, which are no adopted controls.
+  void CommitPendingInput() override;
   void Destroy() override;
   bool IsParameter() const override { return true; }
   bool IsParamEnabled() const override;

@@ -26,6 +26,7 @@
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/Image.h"
 #include "Host/Toolkit/InputBox.h"
+#include "Host/Toolkit/RepeatTimer.h"
 #include "Host/Toolkit/ScriptedInputBox.h"
 #include "Host/Toolkit/ScriptedMenuTracker.h"
 #include "Host/Toolkit/ShortcutManager.h"
@@ -487,12 +488,23 @@ std::string ScriptRunner::RunMemory(const ScriptCommand& command, ScriptRunResul
 }
 
 void ScriptRunner::RunWait(int milliseconds) {
-  // Real time passes while posted work and playback run, as they would in the window.
-  const auto until = std::chrono::steady_clock::now() + std::chrono::milliseconds(milliseconds);
+  // Real time passes while posted work and playback run, as they would in the window; the
+  // toolkit's timers (tool tips) move by exactly the time waited, so what they show after the
+  // wait does not depend on the machine's speed.
+  RepeatTimer& timers = RepeatTimer::Instance();
+  const RepeatTimer::Milliseconds base = timers.Now();
+  const RepeatTimer::Milliseconds length{milliseconds};
+  const auto start = std::chrono::steady_clock::now();
+  const auto until = start + length;
   while (std::chrono::steady_clock::now() < until) {
     Settle();
+    const auto elapsed = std::chrono::duration_cast<RepeatTimer::Milliseconds>(
+        std::chrono::steady_clock::now() - start);
+    timers.AdvanceTo(base + std::min(elapsed, length));
     std::this_thread::sleep_for(std::chrono::milliseconds(5));
   }
+  timers.AdvanceTo(base + length);
+  Settle();
 }
 
 std::string ScriptRunner::RunClose(const ScriptCommand& command, ScriptRunResult& result) {

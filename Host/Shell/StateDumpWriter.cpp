@@ -16,6 +16,7 @@
 #include "Host/Shell/TimelineView.h"
 #include "Host/Shell/WorkspaceFrame.h"
 #include "Host/Toolkit/Cursor.h"
+#include "Host/Toolkit/PersistentToolTip.h"
 #include "Host/Toolkit/TabView.h"
 #include "Host/Toolkit/ViewHost.h"
 
@@ -183,6 +184,8 @@ std::string StateDumpWriter::Write(Application& application) {
     tabs.push_back({{"handler", tab->GetHandlerID()}, {"name", tab->GetTabName()}});
   workspace["tabs"] = std::move(tabs);
   workspace["cursor"] = std::string(CursorName(GetCurrentCursor()));
+  const PersistentToolTip* tip = application.GetViewHost().GetShownToolTip();
+  workspace["toolTip"] = tip != nullptr ? ordered_json(tip->GetText()) : ordered_json();
   // Only in the editing layout, so that dumps of the panel alone stay as they were.
   if (ordered_json editing = EditingViewsJSON(frame); !editing.is_null()) {
     workspace["timeline"] = std::move(editing["timeline"]);

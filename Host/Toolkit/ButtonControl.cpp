@@ -4,35 +4,19 @@
 
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/DC.h"
-#include "Host/Toolkit/PersistentToolTip.h"
-#include "Host/Toolkit/RepeatTimer.h"
 
 ButtonControl::ButtonControl(CommandID command, Commander* commander)
     : SubView(commander), mCommand(command) {
   SetTakesFocusOnClick(true);
 }
 
-ButtonControl::~ButtonControl() {
-  if (mToolTipTimer != 0) {
-    RepeatTimer::Instance().Cancel(mToolTipTimer);
-  }
-}
-
-void ButtonControl::SetToolTip(std::string text) {
-  mToolTip = std::move(text);
-  if (mToolTip.empty()) {
-    HideToolTip();
-  } else if (mShownToolTip != nullptr) {
-    mShownToolTip->SetText(mToolTip);
-  }
-}
+ButtonControl::~ButtonControl() = default;
 
 bool ButtonControl::Click(KeyModifiers modifiers) {
   if (!IsEnabledInTree() || !IsVisible()) {
     return false;
   }
   const std::shared_ptr<const void> alive = KeepAliveForDispatch();
-  HideToolTip();
   return ClickSelf(modifiers);
 }
 
@@ -48,7 +32,6 @@ bool ButtonControl::SendCommand() {
 }
 
 void ButtonControl::LeftButtonDownSelf(Point point, KeyModifiers /*modifiers*/) {
-  HideToolTip();
   mTracking = true;
   mInside = GetLocalBounds().Contains(point);
   CaptureMouse();
@@ -68,9 +51,6 @@ void ButtonControl::MouseMoveSelf(Point point, KeyModifiers /*modifiers*/) {
     mHovered = true;
     Invalidate();
   }
-  if (inside) {
-    ScheduleToolTip();
-  }
 }
 
 void ButtonControl::LeftButtonUpSelf(Point point, KeyModifiers modifiers) {
@@ -88,7 +68,6 @@ void ButtonControl::LeftButtonUpSelf(Point point, KeyModifiers modifiers) {
 }
 
 void ButtonControl::MouseLeaveSelf() {
-  HideToolTip();
   if (mHovered) {
     mHovered = false;
     Invalidate();
@@ -98,12 +77,10 @@ void ButtonControl::MouseLeaveSelf() {
 void ButtonControl::HideSelf() {
   mTracking = false;
   mHovered = false;
-  HideToolTip();
 }
 
 void ButtonControl::DestroySelf() {
   mTracking = false;
-  HideToolTip();
 }
 
 bool ButtonControl::KeyDownSelf(const KeyEvent& event) {
@@ -126,35 +103,4 @@ void ButtonControl::PaintFace(DC& dc, const Rect& rect, bool framed) const {
   if (framed) {
     dc.FrameRect(rect, ColorManager::GetColor(kColor_ControlBorder));
   }
-}
-
-void ButtonControl::ScheduleToolTip() {
-  if (mToolTip.empty() || mShownToolTip != nullptr || mToolTipTimer != 0 || GetHost() == nullptr) {
-    return;
-  }
-  std::weak_ptr<ViewBase> weak = weak_from_this();
-  mToolTipTimer = RepeatTimer::Instance().Schedule(
-      std::chrono::milliseconds(kToolTipDelayMilliseconds), [weak] {
-        const std::shared_ptr<ViewBase> view = weak.lock();
-        auto* button = static_cast<ButtonControl*>(view.get());
-        if (button == nullptr) {
-          return;
-        }
-        button->mToolTipTimer = 0;
-        const std::optional<Point> mouse = button->GetMouseLocation();
-        if (!button->mHovered || button->mTracking || !mouse || !button->IsShown() ||
-            !button->GetLocalBounds().Contains(*mouse)) {
-          return;
-        }
-        button->mShownToolTip = std::make_unique<PersistentToolTip>(*button, button->mToolTip,
-                                                                    button->LocalToWindow(*mouse));
-      });
-}
-
-void ButtonControl::HideToolTip() {
-  if (mToolTipTimer != 0) {
-    RepeatTimer::Instance().Cancel(mToolTipTimer);
-    mToolTipTimer = 0;
-  }
-  mShownToolTip.reset();
 }

@@ -8,7 +8,6 @@
 #include "Host/Toolkit/SubView.h"
 
 class DC;
-class PersistentToolTip;
 
 // What every push button shares: it looks pressed while the left button is held over it,
 // clicks on release inside it (or on Space and Return while it has the focus), and then sends
@@ -23,12 +22,6 @@ class ButtonControl : public SubView {
   void SetCommand(CommandID command) { mCommand = command; }
   CommandID GetCommand() const { return mCommand; }
 
-  // Plain text or a "$$$/" key (localised when shown). Empty: no tool tip.
-  void SetToolTip(std::string text);
-  const std::string& GetToolTip() const { return mToolTip; }
-  // The tool tip shown after resting over the button, or null.
-  const PersistentToolTip* GetShownToolTip() const { return mShownToolTip.get(); }
-
   // True while the left button is held down over the button.
   bool IsPressed() const { return mTracking && mInside; }
   bool IsHovered() const { return mHovered; }
@@ -36,9 +29,6 @@ class ButtonControl : public SubView {
   // Clicks as the user would; nothing when the button is disabled or hidden. True when the
   // command was handled.
   bool Click(KeyModifiers modifiers = kKeyModifierNone);
-
-  // How long the pointer rests before the tool tip shows.
-  static constexpr int kToolTipDelayMilliseconds = 600;
 
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
   void LeftButtonUpSelf(Point point, KeyModifiers modifiers) override;
@@ -62,14 +52,8 @@ class ButtonControl : public SubView {
   void PaintFace(DC& dc, const Rect& rect, bool framed) const;
 
  private:
-  void ScheduleToolTip();
-  void HideToolTip();
-
   CommandID mCommand = kNoCommand;
-  std::string mToolTip;
-  std::unique_ptr<PersistentToolTip> mShownToolTip;
-  std::uint64_t mToolTipTimer = 0;  // RepeatTimer id, 0 when none is pending
-  bool mTracking = false;           // the left button went down on the button
-  bool mInside = false;             // the pointer is over the button while tracking
+  bool mTracking = false;  // the left button went down on the button
+  bool mInside = false;    // the pointer is over the button while tracking
   bool mHovered = false;
 };

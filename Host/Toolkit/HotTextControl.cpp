@@ -221,7 +221,14 @@ void HotTextControl::HideSelf() {
   mScrubbing = false;
 }
 
+void HotTextControl::CommitPendingInput() {
+  if (mEditing) {
+    CommitEditing();
+  }
+}
+
 void HotTextControl::DestroySelf() {
+  CommitPendingInput();
   mEditing = false;
   mPressed = false;
   mScrubbing = false;

@@ -20,9 +20,10 @@ class Message;
 // the modifiers mid-drag does not jump). A press released without scrubbing starts typing: the
 // control takes the focus and selects its text; Enter (or Tab) applies it, Escape leaves the
 // value as it was, and so does text the control cannot read. Losing the focus applies the text
-// on the next idle turn of the message loop. While focused and not typing, Up and Down step the
-// value by one unit (Shift: ten), Enter starts typing, and typed characters start typing.
-// Disabled controls take no input. UI thread only.
+// on the next idle turn of the message loop; going away (CommitPendingInput, or at the latest
+// Destroy) applies it at once, so typed text is only ever dropped by Escape. While focused and not
+// typing, Up and Down step the value by one unit (Shift: ten), Enter starts typing, and typed
+// characters start typing. Disabled controls take no input. UI thread only.
 class HotTextControl : public SubView {
  public:
   static constexpr int kDragThreshold = 3;
@@ -55,6 +56,7 @@ class HotTextControl : public SubView {
   // Applies the typed text; unreadable text ends typing with the value unchanged (false).
   bool CommitEditing();
   void CancelEditing();
+  void CommitPendingInput() override;
 
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
   void LeftButtonMultiClickSelf(Point point, KeyModifiers modifiers, int clickCount) override;

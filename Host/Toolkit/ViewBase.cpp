@@ -390,3 +390,11 @@ void ViewBase::Destroy() {
   DetachFromSuperCommander(false);
   mDestroyed = true;
 }
+
+void ViewBase::SetToolTip(std::string text) {
+  mToolTip = std::move(text);
+}
+
+std::string ViewBase::GetToolTipSelf(Point /*point*/) const {
+  return mToolTip;
+}

@@ -2,6 +2,7 @@
 
 #include <memory>
 #include <optional>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -115,6 +116,20 @@ class ViewBase : public Commander, public std::enable_shared_from_this<ViewBase>
   void SetTakesFocusOnClick(bool takesFocus) { mTakesFocusOnClick = takesFocus; }
   bool TakesFocusOnClick() const { return mTakesFocusOnClick; }
 
+  // --- Tool tips ---
+  // The window shows the tip of the deepest view under a resting pointer that has one, after
+  // ViewHost::kToolTipDelay, and takes it down when the pointer leaves that view or a button
+  // goes down. `text` may be a "$$$/" key; empty for none.
+  void SetToolTip(std::string text);
+  const std::string& GetToolTip() const { return mToolTip; }
+  // The tip at `point` (local); views whose parts have tips of their own override it. The
+  // default is the text given to SetToolTip.
+  virtual std::string GetToolTipSelf(Point point) const;
+
+  // Confirms input the view holds and has not applied yet (typed text), as losing the focus
+  // does; owners call it before the view goes away. The default holds none.
+  virtual void CommitPendingInput() {}
+
   // --- Drag and drop ---
   // A drop target receives the drag hooks for drags over it and over descendants that are no
   // drop targets themselves.
@@ -211,6 +226,7 @@ class ViewBase : public Commander, public std::enable_shared_from_this<ViewBase>
   bool mDoubleBuffered = false;
   bool mAcceptsDrops = false;
   bool mTakesFocusOnClick = false;
+  std::string mToolTip;
   bool mCreated = false;
   bool mDestroying = false;
   bool mDestroyed = false;

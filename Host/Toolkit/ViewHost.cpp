@@ -1,5 +1,6 @@
 #include "Host/Toolkit/ViewHost.h"
 
+#include <chrono>
 #include <utility>
 
 #include "Host/Messaging/Diagnostics.h"
@@ -7,6 +8,8 @@
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/DataObject.h"
 #include "Host/Toolkit/DragDrop.h"
+#include "Host/Toolkit/PersistentToolTip.h"
+#include "Host/Toolkit/RepeatTimer.h"
 #include "Host/Toolkit/ShortcutManager.h"
 #include "Host/Toolkit/ViewBase.h"
 
@@ -26,6 +29,7 @@ ViewHost::ViewHost(Size size, double scale, Commander* superCommander)
     : Commander(superCommander), mSize(size), mScale(scale), mImage(size, scale) {}
 
 ViewHost::~ViewHost() {
+  HideToolTip();
   if (mDrag != nullptr) {
     const std::unique_ptr<DragDrop> drag = std::move(mDrag);
     drag->Cancel();
@@ -144,6 +148,10 @@ void ViewHost::ForgetViewsIn(ViewBase& branch) {
       hovered != nullptr && branch.Contains(*hovered)) {
     mHover.reset();
   }
+  if (const std::shared_ptr<ViewBase> tipView = mToolTipView.lock();
+      tipView != nullptr && branch.Contains(*tipView)) {
+    HideToolTip();
+  }
   if (mDrag != nullptr) {
     if (ViewBase* target = mDrag->GetCurrentTarget();
         target != nullptr && branch.Contains(*target)) {
@@ -158,6 +166,46 @@ void ViewHost::ForgetViewsIn(ViewBase& branch) {
 void ViewHost::NoteInput(Point point, KeyModifiers modifiers) {
   mMousePoint = point;
   SetAsyncKeyModifiers(modifiers);
+}
+
+void ViewHost::HideToolTip() {
+  if (mToolTipTimer != 0) {
+    RepeatTimer::Instance().Cancel(mToolTipTimer);
+    mToolTipTimer = 0;
+  }
+  mToolTipView.reset();
+  mToolTipText.clear();
+  // Taking the tip's view out of the tree may come back here.
+  const std::unique_ptr<PersistentToolTip> tip = std::move(mToolTip);
+}
+
+void ViewHost::UpdateToolTip(const std::shared_ptr<ViewBase>& view, Point point) {
+  ViewBase* owner = view.get();
+  std::string text;
+  for (; owner != nullptr; owner = owner->GetParent()) {
+    text = owner->GetToolTipSelf(owner->WindowToLocal(point));
+    if (!text.empty()) {
+      break;
+    }
+  }
+  if (owner != nullptr && owner == mToolTipView.lock().get() && text == mToolTipText) {
+    return;  // the same tip, shown or on its way
+  }
+  HideToolTip();
+  if (owner == nullptr) {
+    return;
+  }
+  mToolTipView = owner->shared_from_this();
+  mToolTipText = text;
+  mToolTipTimer = RepeatTimer::Instance().Schedule(
+      std::chrono::milliseconds(kToolTipDelayMilliseconds), [this] {
+        mToolTipTimer = 0;
+        const std::shared_ptr<ViewBase> tipView = mToolTipView.lock();
+        if (tipView == nullptr || !tipView->IsShown() || !mMousePoint || mButtonsDown != 0) {
+          return;
+        }
+        mToolTip = std::make_unique<PersistentToolTip>(*tipView, mToolTipText, *mMousePoint);
+      });
 }
 
 void ViewHost::UpdateHover(const std::shared_ptr<ViewBase>& view) {
@@ -199,6 +247,7 @@ void ViewHost::FocusOnClick(ViewBase& view) {
 void ViewHost::MouseDown(MouseButton button, Point point, KeyModifiers modifiers, int clickCount) {
   NoteInput(point, modifiers);
   mButtonsDown |= ButtonBit(button);
+  HideToolTip();
   if (mDrag != nullptr || button == MouseButton::kMiddle) {
     return;
   }
@@ -260,6 +309,9 @@ void ViewHost::MouseMove(Point point, KeyModifiers modifiers) {
     view = HitView(point);
     UpdateHover(view);
     UpdateCursor(view, point, modifiers);
+    if (mButtonsDown == 0) {
+      UpdateToolTip(view, point);
+    }
   }
   if (view != nullptr && view->IsEnabledInTree()) {
     view->MouseMoveSelf(view->WindowToLocal(point), modifiers);
@@ -268,6 +320,7 @@ void ViewHost::MouseMove(Point point, KeyModifiers modifiers) {
 
 void ViewHost::MouseExit() {
   mMousePoint.reset();
+  HideToolTip();
   if (mDrag != nullptr) {
     if (ViewBase* target = mDrag->GetCurrentTarget()) {
       // Outside the window nothing is under the pointer.

@@ -4,6 +4,7 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <string>
 #include <string_view>
 
 #include "Host/Toolkit/Color.h"
@@ -16,6 +17,7 @@
 
 class DataObject;
 class DragDrop;
+class PersistentToolTip;
 class ShortcutManager;
 class ViewBase;
 
@@ -68,6 +70,10 @@ class ViewHost : public Commander {
   // --- Pointer state ---
   ViewBase* GetCaptureView() const;
   std::optional<Point> GetMousePoint() const { return mMousePoint; }
+  // How long the pointer rests on a view before its tool tip shows (ViewBase::SetToolTip).
+  static constexpr int kToolTipDelayMilliseconds = 600;
+  // The tool tip shown now, or null.
+  const PersistentToolTip* GetShownToolTip() const { return mToolTip.get(); }
   bool IsMouseButtonDown() const { return mButtonsDown != 0; }
   // The deepest visible view under `point` (window coordinates), or null.
   ViewBase* GetViewAt(Point point) const;
@@ -124,6 +130,10 @@ class ViewHost : public Commander {
   void UpdateCursor(const std::shared_ptr<ViewBase>& view, Point point, KeyModifiers modifiers);
   void FocusOnClick(ViewBase& view);
   void FinishDrag(Point point, KeyModifiers modifiers);
+  // Schedules the tip of `view` (or its nearest ancestor with one) at `point` (window), or
+  // takes the shown one down when the pointer moved to another tip or to none.
+  void UpdateToolTip(const std::shared_ptr<ViewBase>& view, Point point);
+  void HideToolTip();
 
   Size mSize;
   double mScale = 1.0;
@@ -140,4 +150,9 @@ class ViewHost : public Commander {
   std::uint32_t mButtonsDown = 0;  // bit per MouseButton
   std::unique_ptr<DragDrop> mDrag;
   ShortcutManager* mShortcuts = nullptr;  // not owned; null = ShortcutManager::Instance()
+  // The tip's view is a child of mRoot, so the tip goes first.
+  std::unique_ptr<PersistentToolTip> mToolTip;
+  std::weak_ptr<ViewBase> mToolTipView;  // whose tip is shown or pending
+  std::string mToolTipText;
+  std::uint64_t mToolTipTimer = 0;  // RepeatTimer id, 0 when none is pending
 };

@@ -205,6 +205,10 @@ std::string EffectControlsListHeader::GetToolTipText(Point point) const {
   return HitTestZone(point) == kZoneMaster ? GetMasterGroupText() : GetSequenceGroupText();
 }
 
+std::string EffectControlsListHeader::GetToolTipSelf(Point point) const {
+  return GetToolTipText(point);
+}
+
 void EffectControlsListHeader::PaintSelf(DC& dc) {
   const Rect bounds = GetLocalBounds();
   dc.FillRect(bounds, ColorManager::GetColor(kColor_WindowBackground));

@@ -78,6 +78,11 @@ class EffectControlsListHeader : public SubView {
   // The zone under `point` (local coordinates); kZoneNone outside clip mode.
   Zone HitTestZone(Point point) const;
   std::string GetToolTipText(Point point) const;
+  // The master and sequence group texts' zones (local coordinates) in clip mode.
+  const Rect& GetMasterZoneRect() const { return mMasterZone; }
+  const Rect& GetSequenceZoneRect() const { return mSequenceZone; }
+  // The zone's text shown as the header's tool tip.
+  std::string GetToolTipSelf(Point point) const override;
 
   void FinishCreateSelf() override;
   void SetBoundsSelf(const Rect& bounds) override;

@@ -482,6 +482,23 @@ void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.extra.emplace_back("rulerZoomOut", static_cast<std::int64_t>(mRuler->GetZoomOutTime()));
   dump.extra.emplace_back("audioTimeUnits", mAudioTimeUnits);
   dump.extra.emplace_back("masterClipTargeted", GetMasterClip() != nullptr);
+  // The header's group texts, so a script can click or hover them (panel coordinates).
+  const Rect header = mHeader->GetBounds();
+  for (const auto& [key, zone] :
+       {std::pair{"headerMasterZone", mHeader->GetMasterZoneRect()},
+        std::pair{"headerSequenceZone", mHeader->GetSequenceZoneRect()}}) {
+    const Point centre = zone.Center();
+    dump.extra.emplace_back(std::string(key) + "X",
+                            static_cast<std::int64_t>(header.left + centre.x));
+    dump.extra.emplace_back(std::string(key) + "Y",
+                            static_cast<std::int64_t>(header.top + centre.y));
+  }
+  // "name@ticks" of each marker the ruler shows, in order.
+  std::string markers;
+  for (const TimeBarMarker& marker : mRuler->GetMarkers()) {
+    markers += (markers.empty() ? "" : ", ") + marker.name + "@" + std::to_string(marker.time);
+  }
+  dump.extra.emplace_back("rulerMarkers", markers);
   // Where the list lies in the panel, so a script can turn a row's top into a click.
   const Rect list = mListView->GetBounds();
   dump.extra.emplace_back("listLeft", static_cast<std::int64_t>(list.left));

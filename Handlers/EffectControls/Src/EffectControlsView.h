@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -116,8 +117,8 @@ class EffectControlsView : public TabView,
   // A host edit of the sequence, taken only in sequence mode with editable effects.
   static constexpr int kSequenceEditCommand = 11008;
   static constexpr int kKeyframeAreaCommand = 12100;
-  static constexpr int kBlendModeNormalCommand = 12200;
-  static constexpr int kBlendModeOtherCommand = 12201;
+  static constexpr int kBlendModePreviousCommand = 12200;
+  static constexpr int kBlendModeNextCommand = 12201;
   static constexpr int kFirstCapsuleResetCommand = 24020;
   static constexpr int kLastCapsuleResetCommand = 24035;
   static constexpr int kCapsuleResetAllCommand = 21823;
@@ -289,6 +290,12 @@ class EffectControlsView : public TabView,
   bool HasOwnSliderRows() const;
   void RenameSelectedEffect();
   void SavePreset();
+  // Opens the host's marker editor for the ruler's marker `id`; one undo step when confirmed.
+  void EditMarker(std::int64_t id);
+  // The selected clips' opacity blend mode one step back or on (wrapping), one undo step.
+  bool StepBlendMode(int step, bool apply);
+  // Resets the capsule parameter at `index`, or every one when nullopt; one undo step.
+  bool ResetCapsuleParameters(std::optional<std::size_t> index, bool apply);
   // Moves the edit line: the timeline, the ruler, the time field and the sequence.
   void SetEditTime(TickTime time);
   // Shows where the player is without moving the sequence's edit line.
@@ -296,6 +303,7 @@ class EffectControlsView : public TabView,
   // Shows the ruler's new zoom [zoomIn, zoomOut] in the list and the keyframe area.
   void ApplyRulerZoom();
   void ReloadInOutMarks();
+  // Shows the markers of the sequence, or in master-clip mode the master clip's.
   void ReloadMarkers();
   void ReloadTimeDisplays();
   // A released in, out or in-and-out mark of the ruler: one undoable step.

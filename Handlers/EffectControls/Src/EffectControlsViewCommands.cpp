@@ -98,6 +98,8 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
   if (!mSequence) {
     return false;
   }
+  // Marker edits go to the markers the ruler shows.
+  mMarkers.SetMasterClip(GetMasterClip(), GetMasterClipItem());
   const TickTime editLine = mTimeline->GetEditTime();
   switch (command) {
     case kMarkInCommand:
@@ -147,9 +149,9 @@ bool EffectControlsView::OnNavigationCommand(CommandID command) {
       return true;
     }
     case kEditMarkerCommand:
-      // The host has no marker editor yet: the marker at the edit line is selected for it.
-      mMarkers.SelectAt(editLine);
-      mRuler->Invalidate();
+      if (const auto id = mMarkers.FindAt(editLine)) {
+        EditMarker(*id);
+      }
       return true;
     default:
       if (command >= kFirstColoredMarkerCommand && command <= kLastColoredMarkerCommand) {
@@ -177,8 +179,8 @@ bool EffectControlsView::IsEditingCommand(CommandID command) const {
     case kCommandPaste:
     case kCommandClear:
     case kSequenceEditCommand:
-    case kBlendModeNormalCommand:
-    case kBlendModeOtherCommand:
+    case kBlendModePreviousCommand:
+    case kBlendModeNextCommand:
     case kCapsuleResetAllCommand:
       return true;
     default:
@@ -245,6 +247,10 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
   if (IsNavigationCommand(command)) {
     const bool target = mSequence != nullptr || GetMasterClip() != nullptr;
     status.enabled = target && (editable || !IsEditingCommand(command));
+    if (command == kEditMarkerCommand && status.enabled) {
+      mMarkers.SetMasterClip(GetMasterClip(), GetMasterClipItem());
+      status.enabled = mMarkers.FindAt(mTimeline->GetEditTime()).has_value();
+    }
     return true;
   }
   switch (command) {
@@ -273,15 +279,20 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
       }
       return true;
     case kSequenceEditCommand:
-    case kBlendModeNormalCommand:
-    case kBlendModeOtherCommand:
-    case kCapsuleResetAllCommand:
-      // Blend modes and capsule parameters have no host actions yet: off.
       status.enabled = false;
+      return true;
+    case kBlendModePreviousCommand:
+    case kBlendModeNextCommand:
+      status.enabled = editable && StepBlendMode(command == kBlendModeNextCommand ? 1 : -1, false);
+      return true;
+    case kCapsuleResetAllCommand:
+      status.enabled = editable && ResetCapsuleParameters(std::nullopt, false);
       return true;
     default:
       if (command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand) {
-        status.enabled = false;
+        status.enabled =
+            editable && ResetCapsuleParameters(
+                            static_cast<std::size_t>(command - kFirstCapsuleResetCommand), false);
         return true;
       }
       break;
@@ -384,7 +395,18 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
     case kKeyframeAreaCommand:
       mKeyframeView->ObeyCommand(command);
       return true;
+    case kBlendModePreviousCommand:
+    case kBlendModeNextCommand:
+      StepBlendMode(command == kBlendModeNextCommand ? 1 : -1, true);
+      return true;
+    case kCapsuleResetAllCommand:
+      ResetCapsuleParameters(std::nullopt, true);
+      return true;
     default:
+      if (command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand) {
+        ResetCapsuleParameters(static_cast<std::size_t>(command - kFirstCapsuleResetCommand), true);
+        return true;
+      }
       break;
   }
   if (IsNavigationCommand(command)) {
@@ -423,11 +445,6 @@ void EffectControlsView::RenameSelectedEffect() {
   if (name && !name->empty() && *name != component->GetInstanceName()) {
     ComponentActions::SetInstanceName(component, *name);
   }
-}
-
-void EffectControlsView::SavePreset() {
-  // The host has no save-preset dialog yet; the list decides whether presets may be saved.
-  mListView->ObeyCommand(kSavePresetCommand);
 }
 
 void EffectControlsView::NowOnDuty() {

@@ -50,9 +50,7 @@ void EffectControlsView::OnDeferred(DeferredWork work, std::int64_t markerID, Ti
       ReloadMarkers();
       break;
     case DeferredWork::kEditMarker:
-      // The host has no marker editor yet: the marker is selected for it.
-      mMarkers.Select(markerID);
-      mRuler->Invalidate();
+      EditMarker(markerID);
       break;
   }
 }

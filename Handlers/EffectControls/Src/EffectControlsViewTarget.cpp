@@ -282,6 +282,7 @@ void EffectControlsView::FinishClipSelection(int candidates) {
     mListView->DoSequenceClipSelectionChanged(mSequence);
   }
   UpdateAudioButtons();
+  ReloadMarkers();  // a master clip's markers go with its clip
   LayoutPanel();
 }
 

@@ -277,6 +277,7 @@ void EffectControlsView::ReloadInOutMarks() {
 }
 
 void EffectControlsView::ReloadMarkers() {
+  mMarkers.SetMasterClip(GetMasterClip(), GetMasterClipItem());
   mRuler->SetMarkers(mMarkers.GetTimeBarMarkers());
 }
 

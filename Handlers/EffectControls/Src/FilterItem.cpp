@@ -4,6 +4,7 @@
 #include <optional>
 #include <utility>
 
+#include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsMessages.h"
 #include "Handlers/EffectControls/Src/UpdateActiveProgramMonitorViewMessage.h"
 #include "Host/Messaging/Diagnostics.h"
@@ -163,6 +164,7 @@ void FilterItem::FinishCreateSelf() {
   }
 
   const std::size_t presetCount = mComponent->GetPresetCount();
+  mShownPresetCount = presetCount;
   if (presetCount == 1 && mOptions.topLevel && !mNoIndent) {
     mResetButton = AdoptControl(
         std::make_shared<PictureButton>(DecalRect(kEffectControlsResetNormalDecal, 0, 0),
@@ -210,6 +212,14 @@ void FilterItem::Destroy() {
 void FilterItem::ListenToMessage(const Message& message) {
   if (const auto* changed = message.As<ComponentChangedMessage>()) {
     if (changed->component == mComponent && !mOffline) {
+      if (mComponent->GetPresetCount() != mShownPresetCount && IsCreated()) {
+        // The reset button or the popup no longer fits: the list makes its rows again, this
+        // one included.
+        if (auto* list = dynamic_cast<EffectControlsListView*>(GetParentView())) {
+          list->ClearAndRebuildList();
+          return;
+        }
+      }
       mEnabled = mComponent->IsEnabled();
       UpdateSwitch();
       UpdatePresetSelection();  // an undo may have brought another preset back

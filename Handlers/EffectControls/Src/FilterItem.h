@@ -141,6 +141,9 @@ class FilterItem : public EffectItem, public Commander {
   std::shared_ptr<MultiPictureButton> mSwitchButton;
   std::shared_ptr<CheckBoxControl> mSwitchCheckBox;
   std::shared_ptr<PicturePopup> mPresetPopup;
+  // The presets the row's reset button or popup was made for; a saved or removed preset
+  // remakes the rows.
+  std::size_t mShownPresetCount = 0;
   std::shared_ptr<PictureButton> mResetButton;
   std::shared_ptr<PictureButton> mSetupButton;
   std::unique_ptr<ImageList> mImageList;

@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <array>
+#include <chrono>
 #include <cstring>
 #include <utility>
 
@@ -15,6 +16,7 @@
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/Image.h"
 #include "Host/Toolkit/Region.h"
+#include "Host/Toolkit/RepeatTimer.h"
 #include "Host/Toolkit/ViewHost.h"
 
 namespace {
@@ -566,7 +568,13 @@ bool SdlWindow::Pump(int timeoutMs) {
 }
 
 void SdlWindow::Run() {
+  // While a person uses the window the toolkit's timers (tool tips, repeats) follow real time.
+  RepeatTimer& timers = RepeatTimer::Instance();
+  const RepeatTimer::Milliseconds base = timers.Now();
+  const auto start = std::chrono::steady_clock::now();
   while (mImpl->Pump(50)) {
+    timers.AdvanceTo(base + std::chrono::duration_cast<RepeatTimer::Milliseconds>(
+                                std::chrono::steady_clock::now() - start));
   }
 }
 

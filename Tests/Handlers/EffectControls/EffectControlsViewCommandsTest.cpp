@@ -260,8 +260,8 @@ TEST_F(PanelCommandTest, AReadOnlySequenceTakesEditingCommandsAndDoesNothing) {
   EXPECT_TRUE(sequence->GetMarkers().IsEmpty());
 }
 
-TEST_F(PanelCommandTest, CommandsOfPartsNotBuiltYetAreOff) {
-  EXPECT_FALSE(StatusOf(*view, View::kBlendModeNormalCommand).enabled);
+TEST_F(PanelCommandTest, CommandsWithNothingToActOnAreOff) {
+  EXPECT_FALSE(StatusOf(*view, View::kBlendModeNextCommand).enabled);
   EXPECT_FALSE(StatusOf(*view, View::kFirstCapsuleResetCommand + 4).enabled);
   EXPECT_FALSE(StatusOf(*view, View::kPlayAudioCommand).enabled);  // no audio part
   EXPECT_FALSE(StatusOf(*view, View::kLoopAudioCommand).enabled);

@@ -185,6 +185,32 @@ TEST_F(HotFloatControlTest, LosingTheFocusAppliesTheTypedTextWhenIdle) {
   EXPECT_EQ(recorder.lines, Lines{"HotFloatChanged 55 #150"});
 }
 
+TEST_F(HotFloatControlTest, AFieldDestroyedWhileTypingAppliesTheTextAtOnce) {
+  // Regression: the text waited for an idle turn that found the field destroyed, and was lost.
+  Click({60, 30});
+  Type("42");
+  field->Destroy();
+  EXPECT_EQ(recorder.lines, Lines{"HotFloatChanged 42 #150"});
+  MessageLoop::Instance().RunPending();
+  EXPECT_EQ(recorder.lines.size(), 1u) << "the focus change applies nothing twice";
+}
+
+TEST_F(HotFloatControlTest, EscapeIsTheOnlyWayTypedTextIsDropped) {
+  TypeAndPress("42", KeyCode::kEscape);
+  field->CommitPendingInput();
+  field->Destroy();
+  EXPECT_TRUE(recorder.lines.empty());
+}
+
+TEST_F(HotFloatControlTest, CommitPendingInputAppliesTypedTextOnce) {
+  Click({60, 30});
+  Type("7");
+  field->CommitPendingInput();
+  field->CommitPendingInput();
+  EXPECT_FALSE(field->IsEditing());
+  EXPECT_EQ(recorder.lines, Lines{"HotFloatChanged 7 #150"});
+}
+
 TEST_F(HotFloatControlTest, TypingIntoAFocusedFieldStartsEditing) {
   Click({60, 30});
   Key(KeyCode::kReturn);

@@ -3,6 +3,8 @@
 #include "Host/Messaging/Diagnostics.h"
 #include "Host/Toolkit/MultiPictureButton.h"
 #include "Host/Toolkit/PersistentToolTip.h"
+#include "Host/Toolkit/RepeatTimer.h"
+#include "Host/Toolkit/ViewHost.h"
 #include "Tests/Host/Toolkit/ControlTestSupport.h"
 
 namespace {
@@ -102,14 +104,45 @@ TEST_F(MultiPictureButtonTest, TheToolTipShowsAfterResting) {
   button->SetToolTip(
       "$$$/Vantile/Handlers/EffectControls/KeyframeExpander=Show/Hide Timeline View");
   Move({25, 15});
-  EXPECT_EQ(button->GetShownToolTip(), nullptr);
-  RepeatTimer::Instance().AdvanceBy(
-      std::chrono::milliseconds(ButtonControl::kToolTipDelayMilliseconds));
-  ASSERT_NE(button->GetShownToolTip(), nullptr);
-  EXPECT_EQ(button->GetShownToolTip()->GetText(), "Show/Hide Timeline View");
-  EXPECT_TRUE(button->GetShownToolTip()->IsShown());
+  EXPECT_EQ(host.GetShownToolTip(), nullptr);
+  RepeatTimer::Instance().AdvanceBy(std::chrono::milliseconds(ViewHost::kToolTipDelayMilliseconds));
+  ASSERT_NE(host.GetShownToolTip(), nullptr);
+  EXPECT_EQ(host.GetShownToolTip()->GetText(), "Show/Hide Timeline View");
+  EXPECT_TRUE(host.GetShownToolTip()->IsShown());
   Move({200, 150});
-  EXPECT_EQ(button->GetShownToolTip(), nullptr);
+  EXPECT_EQ(host.GetShownToolTip(), nullptr);
+}
+
+TEST_F(MultiPictureButtonTest, AButtonPressTakesTheTipDownAndStopsOneOnItsWay) {
+  button->SetToolTip("tip");
+  Move({25, 15});
+  RepeatTimer::Instance().AdvanceBy(std::chrono::milliseconds(ViewHost::kToolTipDelayMilliseconds));
+  ASSERT_NE(host.GetShownToolTip(), nullptr);
+  Press({25, 15});
+  EXPECT_EQ(host.GetShownToolTip(), nullptr);
+  Release({25, 15});
+  Move({26, 15});
+  Press({26, 15});
+  RepeatTimer::Instance().AdvanceBy(std::chrono::milliseconds(1000));
+  EXPECT_EQ(host.GetShownToolTip(), nullptr) << "a tip due while the button is down stays away";
+  Release({26, 15});
+}
+
+TEST_F(MultiPictureButtonTest, AViewWithoutATipShowsItsParentsTipAndNoneWhenNeitherHasOne) {
+  Move({200, 150});
+  RepeatTimer::Instance().AdvanceBy(std::chrono::milliseconds(1000));
+  EXPECT_EQ(host.GetShownToolTip(), nullptr);
+  root->SetToolTip("the panel");
+  Move({25, 15});
+  RepeatTimer::Instance().AdvanceBy(std::chrono::milliseconds(1000));
+  ASSERT_NE(host.GetShownToolTip(), nullptr);
+  EXPECT_EQ(host.GetShownToolTip()->GetText(), "the panel");
+  button->SetToolTip("the button");
+  Move({26, 15});
+  EXPECT_EQ(host.GetShownToolTip(), nullptr) << "another tip takes the shown one down";
+  RepeatTimer::Instance().AdvanceBy(std::chrono::milliseconds(1000));
+  ASSERT_NE(host.GetShownToolTip(), nullptr);
+  EXPECT_EQ(host.GetShownToolTip()->GetText(), "the button");
 }
 
 TEST_F(MultiPictureButtonTest, ATipDueAfterTheButtonIsGoneDoesNothing) {

@@ -146,6 +146,31 @@ inline std::string TrianglePoint(const ListPlace& list, const Row& row) {
   return text.str();
 }
 
+// A parameter of a saved project file: of the effect `matchName` on the track item `itemId`.
+inline const json* FindProjectParam(const json& project, long long itemId,
+                                    const std::string& matchName, const std::string& paramName) {
+  for (const json& sequence : project.at("sequences")) {
+    for (const json& track : sequence.at("tracks")) {
+      for (const json& item : track.at("items")) {
+        if (item.at("id").get<long long>() != itemId) {
+          continue;
+        }
+        for (const json& component : item.at("chain").at("components")) {
+          if (component.value("matchName", "") != matchName) {
+            continue;
+          }
+          for (const json& param : component.at("params")) {
+            if (param.value("name", "") == paramName) {
+              return &param;
+            }
+          }
+        }
+      }
+    }
+  }
+  return nullptr;
+}
+
 inline std::vector<std::string> UndoDone(const json& dump) {
   return dump.at("undo").at("done").get<std::vector<std::string>>();
 }
