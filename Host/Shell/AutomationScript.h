@@ -37,6 +37,8 @@ enum class ScriptVerb {
   kTool,
   kOpen,
   kReopenPanel,
+  kPress,
+  kRelease,
 };
 
 // Key modifier bits of the host's modifier word.

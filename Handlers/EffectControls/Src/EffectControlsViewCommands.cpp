@@ -267,6 +267,16 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
       }
       status.enabled = status.enabled && editable;
       return true;
+    case kCommandCut:
+    case kCommandCopy:
+      if (!mListView->FindCommandStatus(command, status) || !status.enabled) {
+        status = CommandStatus{};
+        mKeyframeView->FindCommandStatus(command, status);
+      }
+      if (command == kCommandCut) {
+        status.enabled = status.enabled && editable;
+      }
+      return true;
     case kKeyframeAreaCommand:
       if (!mKeyframeView->FindCommandStatus(command, status)) {
         status = CommandStatus{};
@@ -283,6 +293,9 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
       if (command >= kFirstCapsuleResetCommand && command <= kLastCapsuleResetCommand) {
         status.enabled = false;
         return true;
+      }
+      if (EffectControlsKeyframeView::IsKeyframeCommand(command)) {
+        return mKeyframeView->FindCommandStatus(command, status);
       }
       break;
   }
@@ -381,11 +394,21 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
         mKeyframeView->ObeyCommand(command);
       }
       return true;
+    case kCommandCut:
+    case kCommandCopy:
+      // Effects first, else keyframes.
+      if (!mListView->ObeyCommand(command)) {
+        mKeyframeView->ObeyCommand(command);
+      }
+      return true;
     case kKeyframeAreaCommand:
       mKeyframeView->ObeyCommand(command);
       return true;
     default:
       break;
+  }
+  if (EffectControlsKeyframeView::IsKeyframeCommand(command)) {
+    return mKeyframeView->ObeyCommand(command);
   }
   if (IsNavigationCommand(command)) {
     OnNavigationCommand(command);
