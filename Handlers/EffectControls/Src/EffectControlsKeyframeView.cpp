@@ -54,12 +54,27 @@ EffectControlsKeyframeView::EffectControlsKeyframeView(Commander* superCommander
 EffectControlsKeyframeView::~EffectControlsKeyframeView() = default;
 
 void EffectControlsKeyframeView::DestroySelf() {
-  // Rows outlive nothing of ours: they must not keep pointing at this area.
-  for (const Section& section : CollectSections(false)) {
-    for (const Track& track : section.tracks) {
-      if (track.param != nullptr && track.param->GetKeyframeViewer() == this) {
-        track.param->SetKeyframeViewer(nullptr);
+  // The rows may outlive this area: none may keep pointing at it, shown or not.
+  if (const auto list = mList.lock()) {
+    std::function<void(const std::shared_ptr<EffectItem>&)> forget =
+        [&](const std::shared_ptr<EffectItem>& row) {
+          auto* param = dynamic_cast<ParameterControl*>(row.get());
+          if (param != nullptr && param->GetKeyframeViewer() == this) {
+            param->SetKeyframeViewer(nullptr);
+          }
+          for (const auto& child : row->GetItems()) {
+            forget(child);
+          }
+        };
+    const auto forgetAll = [&](const EffectItemList& rows) {
+      for (const auto& row : rows) {
+        forget(row);
       }
+    };
+    forgetAll(list->GetGraphicsItems());
+    forgetAll(list->GetVideoItems());
+    for (const auto& part : list->GetAudioParts()) {
+      forgetAll(part->GetItems());
     }
   }
   mActor.reset();

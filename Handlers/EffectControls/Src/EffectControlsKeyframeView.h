@@ -93,6 +93,10 @@ class EffectControlsKeyframeView : public EffectControlsKeyframeViewHSLBase,
   static constexpr int kAutoScrollMargin = 10;
   static constexpr int kMarqueeScrollMargin = 10;
   static constexpr int kMarqueeMaxScrollStep = 20;
+  // How far a marquee held at `y` scrolls the rows at each repeat: within kMarqueeScrollMargin
+  // of an edge (or beyond it) half the distance past the margin, toward zero, at most
+  // kMarqueeMaxScrollStep; 0 elsewhere.
+  static int MarqueeScrollStep(int y, const Rect& bounds);
   // Arrow keys move the selection by one frame; Shift by this many.
   static constexpr int kLargeNudgeFrames = 10;
 
@@ -265,8 +269,9 @@ class EffectControlsKeyframeView : public EffectControlsKeyframeViewHSLBase,
   std::optional<int> GetClipBarTop() const;
   void PaintClipBar(DC& dc, const TrackItem& clip, int barTop) const;
   void PaintIntroOutro(DC& dc, const TrackItem& clip, std::optional<int> barTop) const;
-  void PaintSection(DC& dc, const Section& section) const;
-  void PaintTrack(DC& dc, const Track& track) const;
+  // Registers the area with the rows it draws (they ask it for command states).
+  void PaintSection(DC& dc, const Section& section);
+  void PaintTrack(DC& dc, const Track& track);
   void PaintSummaryTrack(DC& dc, const Track& track) const;
   void PaintCurrentTime(DC& dc, const Section& section) const;
   void PaintMarquee(DC& dc) const;

@@ -2,10 +2,7 @@
 
 #include "Handlers/EffectControls/Public/EffectControlsListView.h"
 #include "Handlers/EffectControls/Src/EffectControlsKeyframeView.h"
-#include "Handlers/EffectControls/Src/FilterItem.h"
-#include "Handlers/EffectControls/Src/KeyframeMarquee.h"
 #include "Handlers/EffectControls/Src/PanelTimeline.h"
-#include "Host/Messaging/Localization.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/IntroOutroActions.h"
 #include "Host/Model/KeyframeMultiSelection.h"
@@ -14,24 +11,9 @@
 #include "Host/Model/TrackItem.h"
 #include "Host/Rows/EffectItem.h"
 #include "Host/Rows/ParameterControl.h"
-#include "Host/Toolkit/ControlMessages.h"
 #include "Host/Toolkit/Cursor.h"
 #include "Host/Toolkit/PersistentToolTip.h"
 #include "Host/Toolkit/RepeatTimer.h"
-
-namespace {
-
-constexpr const char* kIntroLengthText =
-    "$$$/Vantile/HandlerEffectControls/EffectControlsKeyframeView/IntroLength=Intro Duration: ";
-constexpr const char* kOutroLengthText =
-    "$$$/Vantile/HandlerEffectControls/EffectControlsKeyframeView/OutroLength=Outro Duration: ";
-
-// Integer division toward zero, as the marquee's scroll steps are specified.
-int MarqueeStep(int beyond, int limit) {
-  return std::clamp(beyond / 2, -limit, limit);
-}
-
-}  // namespace
 
 // --- Press ---
 
@@ -135,72 +117,6 @@ bool EffectControlsKeyframeView::PressKeyframe(const Track& track, Point point,
   return true;
 }
 
-void EffectControlsKeyframeView::StartMarquee(Point point, KeyModifiers modifiers) {
-  const auto list = mList.lock();
-  const auto selection = GetSelection();
-  if (!IsShiftDown(modifiers) && !IsCtrlDown(modifiers)) {
-    selection->Clear();
-  }
-  // A press beside the effect whose on-screen controls show keeps that effect selected.
-  const auto row = list->FindItemFromPoint(Point{0, point.y});
-  const ComponentRef manipulated = list->GetDirectManipulationComponent();
-  const auto* filter = dynamic_cast<const FilterItem*>(row.get());
-  const bool onManipulated = filter != nullptr && manipulated && filter->Component() == manipulated;
-  if (!onManipulated) {
-    list->ClearSelection();
-  }
-  mGesture = Gesture::kMarquee;
-  mMarqueeAnchor = point;
-  mMarqueePoint = point;
-  mMarqueeAnchorTime = XToTime(point.x);
-  SetCurrentCursor(Cursor::kPrecisePath);
-  if (!mListeningToRepeat) {
-    AddListener(RepeatTimer::Instance().GetStation(), *this);
-    mListeningToRepeat = true;
-  }
-  Invalidate();
-}
-
-EffectControlsKeyframeView::IntroOutroHit EffectControlsKeyframeView::HitIntroOutro(
-    Point point) const {
-  const TrackItemRef clip = GetClip();
-  const std::optional<int> barTop = GetClipBarTop();
-  if (!clip || !barTop || !IntroOutroActions::CanResize(*clip)) {
-    return IntroOutroHit::kNone;
-  }
-  // The handles live in the clip bar; below it the keyframes beside them stay reachable.
-  if (point.y < *barTop || point.y >= *barTop + kClipBarHeight) {
-    return IntroOutroHit::kNone;
-  }
-  const int introX = TimeToX(AddTimes(clip->GetStart(), clip->GetEffectiveIntroDuration()));
-  const int outroX = TimeToX(SubtractTimes(clip->GetEnd(), clip->GetEffectiveOutroDuration()));
-  if (std::abs(point.x - introX) <= kIntroOutroHitPixels && point.x < outroX) {
-    return IntroOutroHit::kIntro;
-  }
-  if (std::abs(point.x - outroX) <= kIntroOutroHitPixels) {
-    return IntroOutroHit::kOutro;
-  }
-  return IntroOutroHit::kNone;
-}
-
-void EffectControlsKeyframeView::StartIntroOutro(IntroOutroHit hit, Point point) {
-  const TrackItemRef clip = GetClip();
-  mGesture = hit == IntroOutroHit::kIntro ? Gesture::kIntro : Gesture::kOutro;
-  mDraggedDuration = hit == IntroOutroHit::kIntro ? clip->GetEffectiveIntroDuration()
-                                                  : clip->GetEffectiveOutroDuration();
-  mToolTip =
-      std::make_unique<PersistentToolTip>(*this, IntroOutroToolTipText(), LocalToWindow(point));
-  Invalidate();
-}
-
-std::string EffectControlsKeyframeView::IntroOutroToolTipText() const {
-  const auto list = mList.lock();
-  const FrameRate rate =
-      list && list->GetSequence() ? list->GetSequence()->GetVideoFrameRate() : kFrameRate_25;
-  return LocalizeString(mGesture == Gesture::kIntro ? kIntroLengthText : kOutroLengthText) +
-         rate.FormatTimecode(mDraggedDuration);
-}
-
 void EffectControlsKeyframeView::ShowMenu(const char* menu, Point point) {
   TrackPopupMenu(menu, point);
 }
@@ -275,97 +191,6 @@ void EffectControlsKeyframeView::AutoScrollHorizontally(Point point) {
     BroadcastMessage(list->GetKeyframeViewStation(),
                      EffectControlsAutoScrollMessage(beyond * GetPixelSpan()));
   }
-}
-
-void EffectControlsKeyframeView::UpdateMarquee(Point point) {
-  const auto list = mList.lock();
-  const auto selection = GetSelection();
-  if (!list || !selection) {
-    return;
-  }
-  mMarqueePoint = point;
-  std::vector<KeyframeMarquee::Track> tracks;
-  for (const Section& section : CollectSections(false)) {
-    for (const Track& track : section.tracks) {
-      if (IsKeyframeTrack(track)) {
-        tracks.push_back(KeyframeMarquee::Track{
-            .top = track.row->GetTop(),
-            .bottom = track.row->GetBottom(),
-            .trackItem = track.param->GetTrackItem(),
-            .component = track.param->GetComponent(),
-            .param = track.param->GetParam(),
-        });
-      }
-    }
-  }
-  const Rect rect = GetMarqueeRect();
-  const TickTime pointTime = XToTime(point.x);
-  KeyframeMultiSelection found(list->GetSequence());
-  if (rect.Width() >= 1) {
-    KeyframeMarquee::Collect(tracks, rect.top, rect.bottom, std::min(mMarqueeAnchorTime, pointTime),
-                             std::max(mMarqueeAnchorTime, pointTime), found);
-  }
-  if (IsShiftDown(mPressModifiers)) {
-    selection->AddItems(found);
-  } else if (IsCtrlDown(mPressModifiers) && mSelectionAtPress) {
-    *selection = *mSelectionAtPress;
-    selection->InvertItems(found);
-  } else {
-    *selection = found;
-  }
-  Redraw();
-}
-
-void EffectControlsKeyframeView::AutoScrollMarquee() {
-  const auto list = mList.lock();
-  const std::optional<Point> mouse = GetMouseLocation();
-  if (!list || !mouse) {
-    return;
-  }
-  const Rect bounds = GetLocalBounds();
-  int step = 0;
-  if (mouse->y < bounds.top + kMarqueeScrollMargin) {
-    step = MarqueeStep(mouse->y - bounds.top - kMarqueeScrollMargin, kMarqueeMaxScrollStep);
-  } else if (mouse->y > bounds.bottom - kMarqueeScrollMargin) {
-    step = MarqueeStep(mouse->y - bounds.bottom + kMarqueeScrollMargin, kMarqueeMaxScrollStep);
-  }
-  if (step == 0) {
-    return;
-  }
-  const int before = list->GetScrollOffset();
-  list->OnVScroll(ScrollCode::kThumbPosition, before + step, kKeyModifierNone);
-  list->UpdateVScrollBar();
-  // The anchor stays on the content it was pressed on.
-  mMarqueeAnchor.y -= list->GetScrollOffset() - before;
-  UpdateMarquee(*mouse);
-}
-
-void EffectControlsKeyframeView::DragIntroOutro(Point point) {
-  const TrackItemRef clip = GetClip();
-  if (!clip) {
-    return;
-  }
-  const FrameRate rate = clip->GetFrameRate();
-  const TickTime gap = IntroOutroActions::GetMinimumGap(*clip);
-  const TickTime atPointer =
-      AddTimes(GetVisibleStartTime(), static_cast<TickTime>(point.x) * GetPixelSpan());
-  // A short clip leaves no room: the upper bound never goes below the lower one.
-  if (mGesture == Gesture::kIntro) {
-    const TickTime upper =
-        std::max<TickTime>(0, clip->GetDuration() - clip->GetEffectiveOutroDuration() - gap);
-    mDraggedDuration = std::clamp(rate.AlignToFrame(SubtractTimes(atPointer, clip->GetStart())),
-                                  TickTime{0}, upper);
-  } else {
-    const TickTime upper =
-        std::max<TickTime>(0, clip->GetDuration() - clip->GetEffectiveIntroDuration() - gap);
-    mDraggedDuration =
-        std::clamp(rate.AlignToFrame(SubtractTimes(clip->GetEnd(), atPointer)), TickTime{0}, upper);
-  }
-  if (mToolTip) {
-    mToolTip->SetText(IntroOutroToolTipText());
-    mToolTip->MoveTo(LocalToWindow(point));
-  }
-  Redraw();
 }
 
 // --- Release and cancel ---
@@ -458,22 +283,6 @@ void EffectControlsKeyframeView::ResetGestureState() {
   if (mGesture == Gesture::kIdle) {
     mSelectionAtPress.reset();
   }
-}
-
-TickTime EffectControlsKeyframeView::GetShownIntroDuration() const {
-  if (mGesture == Gesture::kIntro) {
-    return mDraggedDuration;
-  }
-  const TrackItemRef clip = GetClip();
-  return clip ? clip->GetEffectiveIntroDuration() : 0;
-}
-
-TickTime EffectControlsKeyframeView::GetShownOutroDuration() const {
-  if (mGesture == Gesture::kOutro) {
-    return mDraggedDuration;
-  }
-  const TrackItemRef clip = GetClip();
-  return clip ? clip->GetEffectiveOutroDuration() : 0;
 }
 
 // --- Hover, pan and keys ---

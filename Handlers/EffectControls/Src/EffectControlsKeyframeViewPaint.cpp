@@ -182,7 +182,7 @@ void EffectControlsKeyframeView::PaintIntroOutro(DC& dc, const TrackItem& clip,
   }
 }
 
-void EffectControlsKeyframeView::PaintSection(DC& dc, const Section& section) const {
+void EffectControlsKeyframeView::PaintSection(DC& dc, const Section& section) {
   const Rect bounds = GetLocalBounds();
   const Color separator =
       PanelColor("colors.effectscontrols.keyframeview.Hseparator", kColor_ListBoxContentDivider);
@@ -203,7 +203,7 @@ void EffectControlsKeyframeView::PaintSection(DC& dc, const Section& section) co
   }
 }
 
-void EffectControlsKeyframeView::PaintTrack(DC& dc, const Track& track) const {
+void EffectControlsKeyframeView::PaintTrack(DC& dc, const Track& track) {
   if (!mKeyframesVisible) {
     return;
   }
@@ -217,8 +217,7 @@ void EffectControlsKeyframeView::PaintTrack(DC& dc, const Track& track) const {
               separator);
   const Rect rowRect{0, top, bounds.right, row.GetBottom()};
   const DC::ScopedClip clip(dc, rowRect);
-  // The area is this row's viewer while it draws; the row asks it for command states.
-  row.SetKeyframeViewer(const_cast<EffectControlsKeyframeView*>(this));
+  row.SetKeyframeViewer(this);
   std::set<TickTime> selected;
   if (const auto selection = GetSelection()) {
     if (const KeyframeSelection* keys = selection->Find(row.GetParam().get())) {

@@ -2,6 +2,8 @@
 // their menus, and the marquee's replace, add and invert rules.
 #include <gtest/gtest.h>
 
+#include "Host/Model/MarkerActions.h"
+#include "Host/Toolkit/HotTimecodeControl.h"
 #include "Tests/Handlers/EffectControls/KeyframeAreaTestSupport.h"
 
 using namespace keyframe_area_test;
@@ -134,4 +136,45 @@ TEST_F(KeyframeAreaTest, SelectAllSelectsEveryKeyframeAndKeyframeNavigationSelec
   EXPECT_EQ(SelectedSequenceTimes(position), Times{4 * kSec});
   EXPECT_EQ(Selection().GetKeyframeCount(), 1u);
   EXPECT_EQ(Area().NavigateKeyframe(false), std::nullopt);
+}
+
+TEST(KeyframeAreaMarquee, HeldNearAnEdgeItScrollsByHalfTheDistancePastTheMargin) {
+  const Rect area = Rect::FromSize(0, 0, 300, 200);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(-15, area), -12);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(-60, area), -20);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(5, area), -2);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(9, area), 0);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(10, area), 0);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(100, area), 0);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(195, area), 2);
+  EXPECT_EQ(EffectControlsKeyframeView::MarqueeScrollStep(260, area), 20);
+}
+
+TEST_F(KeyframeAreaTest, APressOnAKeyframeSnapsToEverythingButTheSelectedKeyframes) {
+  Marker marker;
+  marker.time = 7 * kSec;
+  ASSERT_EQ(MarkerActions::AddMarker(sequence, marker), EditStatus::Done);
+  OpenClip();
+  Click(Glyph(fade, 5 * kSec));
+  Click(Glyph(position, 4 * kSec), kKeyModifierShift);
+  host->MouseDown(MouseButton::kLeft, Glyph(fade, 5 * kSec), kKeyModifierNone);
+  const std::set<TickTime>& snaps = Area().GetSnapSet().GetTimes();
+  host->MouseUp(MouseButton::kLeft, Glyph(fade, 5 * kSec), kKeyModifierNone);
+  // The edit line (2 s), the clip's edges (2 s, 8 s), the other keyframes and the marker.
+  EXPECT_EQ(snaps, (std::set<TickTime>{2 * kSec, 3 * kSec, 6 * kSec, 7 * kSec, 8 * kSec}));
+}
+
+TEST_F(KeyframeAreaTest, AMovingEditLineDoesNotTakeTheKeysFromATimeFieldBeingEdited) {
+  OpenClip();
+  Click(Glyph(fade, 5 * kSec));
+  ASSERT_TRUE(Area().IsTarget());
+  HotTimecodeControl& field = *view->GetTimecodeControl();
+  const Point at = field.GetBounds().Center();
+  host->MouseMove(at, kKeyModifierNone);
+  host->MouseDown(MouseButton::kLeft, at, kKeyModifierNone);
+  host->MouseUp(MouseButton::kLeft, at, kKeyModifierNone);
+  ASSERT_TRUE(field.IsEditing());
+  sequence->SetCurrentTime(4 * kSec);
+  EXPECT_TRUE(field.IsEditing());
+  EXPECT_FALSE(Area().IsTarget());
 }

@@ -141,6 +141,17 @@ class KeyframeSession : public ::testing::Test {
     return times;
   }
   int EditLineX() const { return layout["extra"]["currentTimeX"].get<int>(); }
+  int AreaLeft() const { return layout["extra"]["keyframeAreaLeft"].get<int>(); }
+  // The first glyph clear of the area's left edge, where a press grabs the list's separator.
+  Glyph Away(const std::vector<Glyph>& glyphs) const {
+    for (const Glyph& glyph : glyphs) {
+      if (glyph.x > AreaLeft() + 10) {
+        return glyph;
+      }
+    }
+    ADD_FAILURE() << "every glyph on the area's edge";
+    return glyphs.front();
+  }
 
   fs::path dir;
   json layout;
@@ -148,7 +159,7 @@ class KeyframeSession : public ::testing::Test {
 };
 
 TEST_F(KeyframeSession, ADraggedKeyframeLandsOnTheEditLineAndUndoRestoresTheProject) {
-  const Glyph opacity = Glyphs(layout, {"Opacity", "Opacity"}).front();
+  const Glyph opacity = Away(Glyphs(layout, {"Opacity", "Opacity"}));
   const int dropX = EditLineX() + 3;
   ASSERT_TRUE(
       Run("drag", {"select 21", std::string("time ") + kEditLine, "click " + At(opacity),
@@ -191,21 +202,23 @@ TEST_F(KeyframeSession, AMarqueeOverTwoRowsSelectsExactlyTheirKeyframes) {
   const int bottom = scale.front().y + 6;
   ASSERT_TRUE(
       Run("marquee", {"select 21", std::string("time ") + kEditLine,
-                      "drag " + std::to_string(left - 12) + " " + std::to_string(top) + " " +
-                          std::to_string(right + 12) + " " + std::to_string(bottom) + " steps 5",
+                      // From the right: the left end lies beyond the area, where the
+                      // captured pointer still drags.
+                      "drag " + std::to_string(right + 12) + " " + std::to_string(top) + " " +
+                          std::to_string(left - 12) + " " + std::to_string(bottom) + " steps 5",
                       "dump marquee.dump.json"}));
   EXPECT_EQ(Selected(Panel("marquee.dump.json")), expected);
 }
 
 TEST_F(KeyframeSession, DeleteCopyAndPasteAreOneStepEachAndUndoRestoresTheProject) {
   const Glyph blur = Glyphs(layout, {"Gaussian Blur", "Blurriness"}).front();
-  const std::vector<Glyph> opacity = Glyphs(layout, {"Opacity", "Opacity"});
-  ASSERT_GE(opacity.size(), 2u);
-  ASSERT_TRUE(Run(
-      "edit", {"select 21", std::string("time ") + kEditLine, "click " + At(blur), "key Delete",
-               "save deleted.json", "click " + At(opacity[0]), "click " + At(opacity[1]) + " shift",
-               "command 57634", "time 00:00:06:00", "command 57637", "dump pasted.dump.json",
-               "save pasted.json", "undo", "undo", "save undone.json"}));
+  const std::vector<Glyph> scale = Glyphs(layout, {"Motion", "Scale"});
+  ASSERT_GE(scale.size(), 3u);
+  ASSERT_TRUE(Run("edit", {"select 21", std::string("time ") + kEditLine, "click " + At(blur),
+                           "key Delete", "save deleted.json", "click " + At(scale[1]),
+                           "click " + At(scale[2]) + " shift", "command 57634", "time 00:00:06:00",
+                           "command 57637", "dump pasted.dump.json", "save pasted.json", "undo",
+                           "undo", std::string("time ") + kEditLine, "save undone.json"}));
   const std::vector<std::int64_t> blurTimes =
       Times(Keyframes(ReadJson(dir / "deleted.json"), "Blurriness"));
   EXPECT_EQ(std::find(blurTimes.begin(), blurTimes.end(), blur.time), blurTimes.end());
@@ -214,10 +227,9 @@ TEST_F(KeyframeSession, DeleteCopyAndPasteAreOneStepEachAndUndoRestoresTheProjec
   ASSERT_EQ(pasted.size(), 2u);
   const std::int64_t first = pasted.begin()->second;
   const std::int64_t second = std::next(pasted.begin())->second;
-  EXPECT_EQ(second - first, opacity[1].time - opacity[0].time);
-  const std::vector<std::int64_t> saved =
-      Times(Keyframes(ReadJson(dir / "pasted.json"), "Opacity"));
-  EXPECT_EQ(saved.size(), opacity.size() + 2);
+  EXPECT_EQ(second - first, scale[2].time - scale[1].time);
+  const std::vector<std::int64_t> saved = Times(Keyframes(ReadJson(dir / "pasted.json"), "Scale"));
+  EXPECT_EQ(saved.size(), scale.size() + 2);
   const Strings undo = program_test::UndoDone(ReadJson(dir / "pasted.dump.json"));
   ASSERT_GE(undo.size(), 2u);
   EXPECT_EQ(undo[undo.size() - 2], "MZ.KeyframeSelection.RemoveKeyframes");
@@ -232,17 +244,21 @@ TEST_F(KeyframeSession, TheContextMenuSetsTheInterpolationAndUndoRestoresTheProj
       Run("menu", {"select 21", std::string("time ") + kEditLine,
                    "menu-answer cmd.effectcontrols.interpolation.hold", "rclick " + At(scale[1]),
                    "save hold.json", "undo", "save undone.json"}));
-  for (const json& key : Keyframes(ReadJson(dir / "hold.json"), "Scale")) {
-    // Hold is the temporal code 0; only the clicked keyframe changed.
-    EXPECT_EQ(key["interpolation"].get<int>() == 0,
-              key["time"].get<std::int64_t>() == scale[1].time)
-        << key.dump();
+  // Hold is the temporal code 0; only the clicked keyframe changed.
+  const json was = Keyframes(json::parse(before), "Scale");
+  const json now = Keyframes(ReadJson(dir / "hold.json"), "Scale");
+  ASSERT_EQ(now.size(), was.size());
+  for (std::size_t i = 0; i < now.size(); ++i) {
+    const bool clicked = now[i]["time"].get<std::int64_t>() == scale[1].time;
+    EXPECT_EQ(now[i]["interpolation"].get<int>(), clicked ? 0 : was[i]["interpolation"].get<int>())
+        << now[i].dump();
   }
+  EXPECT_NE(was[1]["interpolation"].get<int>(), 0);
   EXPECT_EQ(ReadText(dir / "undone.json"), before);
 }
 
 TEST_F(KeyframeSession, ADragInProgressShowsTheKeyframeOnTheEditLineBeforeTheRelease) {
-  const Glyph opacity = Glyphs(layout, {"Opacity", "Opacity"}).front();
+  const Glyph opacity = Away(Glyphs(layout, {"Opacity", "Opacity"}));
   const std::string drop = std::to_string(EditLineX() + 2) + " " + std::to_string(opacity.y);
   ASSERT_TRUE(
       Run("shot", {"select 21", std::string("time ") + kEditLine, "click " + At(opacity),
