@@ -44,13 +44,23 @@ void EffectControlsKeyframeView::PaintSelf(DC& dc) {
   if (!list || !mTimeline || !(GetSecondsPerPixel() > 0.0)) {
     return;
   }
+  const TrackItemRef clip = GetClip();
+  const bool transitionOnly = list->GetTargetKind() == EffectControlsListView::kTargetTransition;
+  if (clip && !transitionOnly) {
+    // The clip's own span shows the area's working background, under the guide.
+    const int start = std::max(0, TimeToX(clip->GetStart()));
+    const int end = std::min(bounds.right, TimeToX(clip->GetEnd()));
+    if (end > start) {
+      dc.FillRect(
+          Rect{start, 0, end, bounds.bottom},
+          PanelColor("colors.effectscontrols.keyframeview.background", kColor_ContentBackground));
+    }
+  }
   if (HasDragGuide()) {
     dc.FillRect(
         Rect{mGuideX, 0, mGuideX + 1, bounds.bottom},
         ColorManager::GetColor(mGuideSnapped ? kColor_ReversibleBlack : kColor_ReversibleWhite));
   }
-  const TrackItemRef clip = GetClip();
-  const bool transitionOnly = list->GetTargetKind() == EffectControlsListView::kTargetTransition;
   if (clip && !transitionOnly) {
     PaintBands(dc, *clip,
                list->GetTargetKind() == EffectControlsListView::kTargetTransitionComponent);
@@ -90,9 +100,6 @@ void EffectControlsKeyframeView::PaintBands(DC& dc, const TrackItem& clip, bool 
     band(end, bounds.right, noClip);
     return;
   }
-  // The clip's own span shows the area's working background.
-  band(start, end,
-       PanelColor("colors.effectscontrols.keyframeview.background", kColor_ContentBackground));
   band(0, mediaStart, noClip);
   band(std::max(0, mediaStart), start, trim);
   band(end, std::min(mediaEnd, bounds.right), trim);
