@@ -138,8 +138,8 @@ void BM_LinearScanOf100000KeyframeTimes(benchmark::State& state) {
   for (auto _ : state) {
     std::size_t inside = 0;
     for (const auto& track : scene.tracks) {
-      for (const TickTime time : track.param->GetKeyframeTimes()) {
-        inside += (time >= MarqueeScene::kFirst && time <= MarqueeScene::kLast) ? 1 : 0;
+      for (const Keyframe& key : track.param->GetKeyframes().Keyframes()) {
+        inside += (key.time >= MarqueeScene::kFirst && key.time <= MarqueeScene::kLast) ? 1 : 0;
       }
     }
     benchmark::DoNotOptimize(inside);
