@@ -395,10 +395,27 @@ bool ParameterControl::HitKeyframe(Point point, TickTime originTime, const Frame
   if (!mParam) {
     return false;
   }
-  for (const Keyframe& key : mParam->GetKeyframes().Keyframes()) {
-    const TickTime time = ClipTimeToSequenceTime(ClipTime(key.time)).Ticks();
+  const KeyframeCurve& curve = mParam->GetKeyframes();
+  const std::vector<Keyframe>& keys = curve.Keyframes();
+  // Keyframes left of the tolerance are skipped by a binary search on the earliest time whose
+  // pixel could be in reach; one step back covers the rounding of the two conversions.
+  std::size_t index = 0;
+  const TickTime frame = timeScale.GetTicksPerFrame();
+  const std::int64_t firstPixel = static_cast<std::int64_t>(point.x) - kKeyframeHitTolerance + 1;
+  if (frame > 0 && firstPixel > -kMaxKeyframeX && firstPixel < kMaxKeyframeX) {
+    const double offset = static_cast<double>(firstPixel) * static_cast<double>(frame);
+    const TickTime firstTime = AddTimes(originTime, SecondsToTicks(offset / kTicksPerSecond));
+    const TickTime firstClipTime = SequenceTimeToClipTime(SequenceTime(firstTime)).Ticks();
+    index = curve.FindAtOrAfter(firstClipTime).value_or(keys.size());
+    index = index > 0 ? index - 1 : 0;
+  }
+  for (; index < keys.size(); ++index) {
+    const TickTime time = ClipTimeToSequenceTime(ClipTime(keys[index].time)).Ticks();
     const std::int64_t x = PixelOf(time, originTime, timeScale);
-    if (x - kKeyframeHitTolerance < point.x && point.x < x + kKeyframeHitTolerance && time >= 0) {
+    if (x >= point.x + kKeyframeHitTolerance) {
+      break;
+    }
+    if (point.x < x + kKeyframeHitTolerance && time >= 0) {
       hitTime = time;
       return true;
     }

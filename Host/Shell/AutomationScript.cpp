@@ -43,6 +43,8 @@ const std::map<std::string, VerbInfo, std::less<>>& VerbTable() {
       {"open", {ScriptVerb::kOpen, false}},
       {"reopen-panel", {ScriptVerb::kReopenPanel, false}},
       {"check", {ScriptVerb::kCheck, false}},
+      {"press", {ScriptVerb::kPress, false}},
+      {"release", {ScriptVerb::kRelease, false}},
   };
   return table;
 }
@@ -118,6 +120,8 @@ class LineParser {
       case ScriptVerb::kClick:
       case ScriptVerb::kRightClick:
       case ScriptVerb::kDoubleClick:
+      case ScriptVerb::kPress:
+      case ScriptVerb::kRelease:
         return ParseIntegersThenModifiers(2, "X and Y", false);
       case ScriptVerb::kDrag:
         return ParseIntegersThenModifiers(4, "X1 Y1 X2 Y2", true);

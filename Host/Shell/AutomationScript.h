@@ -38,6 +38,8 @@ enum class ScriptVerb {
   kOpen,
   kReopenPanel,
   kCheck,
+  kPress,
+  kRelease,
 };
 
 // Key modifier bits of the host's modifier word.

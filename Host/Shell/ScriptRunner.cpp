@@ -145,6 +145,8 @@ std::string ScriptRunner::Execute(const ScriptCommand& command, ScriptRunResult&
     case ScriptVerb::kDrag:
     case ScriptVerb::kMove:
     case ScriptVerb::kWheel:
+    case ScriptVerb::kPress:
+    case ScriptVerb::kRelease:
       return RunPointer(command);
     case ScriptVerb::kKey:
       return RunKey(command);
@@ -292,6 +294,19 @@ std::string ScriptRunner::RunPointer(const ScriptCommand& command) {
     case ScriptVerb::kMove:
       mInput.MouseMove(ToWindow(n.at(0), n.at(1)), modifiers);
       return {};
+    case ScriptVerb::kPress: {
+      // The button stays down: moves drag until a release (a shot can show the drag).
+      const Point point = ToWindow(n.at(0), n.at(1));
+      mInput.MouseMove(point, modifiers);
+      mInput.MouseDown(MouseButton::kLeft, point, modifiers, 1);
+      return {};
+    }
+    case ScriptVerb::kRelease: {
+      const Point point = ToWindow(n.at(0), n.at(1));
+      mInput.MouseMove(point, modifiers);
+      mInput.MouseUp(MouseButton::kLeft, point, modifiers);
+      return {};
+    }
     case ScriptVerb::kWheel: {
       const std::optional<Point> point = mApplication.GetViewHost().GetMousePoint();
       if (!point)

@@ -12,18 +12,15 @@
 #include "Host/Messaging/PropertyList.h"
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ComponentParam.h"
-#include "Host/Model/Keyframe.h"
-#include "Host/Model/KeyframeCurve.h"
 #include "Host/Model/KeyframeMultiSelection.h"
+#include "Host/Model/KeyframeMultiSelectionActor.h"
+#include "Host/Model/ModelMessages.h"
+#include "Host/Model/TrackItem.h"
 #include "Host/Rows/EffectItem.h"
 #include "Host/Rows/ParameterControl.h"
-#include "Host/Toolkit/Bitmap.h"
-#include "Host/Toolkit/ColorManager.h"
-#include "Host/Toolkit/Cursor.h"
-#include "Host/Toolkit/DC.h"
-#include "Host/Toolkit/Decals.h"
-#include "Host/Toolkit/ImageList.h"
-#include "Host/Toolkit/StandardCommands.h"
+#include "Host/Toolkit/HotTextControl.h"
+#include "Host/Toolkit/PersistentToolTip.h"
+#include "Host/Toolkit/RepeatTimer.h"
 
 namespace {
 
@@ -40,44 +37,6 @@ constexpr SnapPreference kSnapPreferences[] = {
     {EffectControlsKeyframeView::kSnapClip, "effect.controls.is.snapping.to.clip"},
 };
 
-// The panel's colour when its set is registered, else the toolkit's.
-Color PanelColor(std::string_view key, std::string_view fallback) {
-  return ColorManager::HasColor(key) ? ColorManager::GetColor(key)
-                                     : ColorManager::GetColor(fallback);
-}
-
-// Glyph kind in the keyframe image order (Linear, Bezier, AutoBezier, Hold, ...).
-int GlyphKind(TemporalInterpolation interpolation) {
-  switch (interpolation) {
-    case TemporalInterpolation::Hold:
-      return 3;
-    case TemporalInterpolation::Bezier:
-    case TemporalInterpolation::ContinuousBezier:
-      return 1;
-    case TemporalInterpolation::AutoBezier:
-      return 2;
-    case TemporalInterpolation::Linear:
-      break;
-  }
-  return 0;
-}
-
-void VisitRows(const EffectItemList& list,
-               const std::function<void(const std::shared_ptr<EffectItem>&)>& visit) {
-  std::function<void(const std::shared_ptr<EffectItem>&)> walk =
-      [&](const std::shared_ptr<EffectItem>& row) {
-        visit(row);
-        if (row->IsExpanded()) {
-          for (const auto& child : row->GetItems()) {
-            walk(child);
-          }
-        }
-      };
-  for (const auto& row : list) {
-    walk(row);
-  }
-}
-
 }  // namespace
 
 EffectControlsKeyframeView::EffectControlsKeyframeView(Commander* superCommander)
@@ -85,10 +44,43 @@ EffectControlsKeyframeView::EffectControlsKeyframeView(Commander* superCommander
   const PropertyList& properties = Preferences::Application().Properties();
   mSnapFlags = 0;
   for (const SnapPreference& preference : kSnapPreferences) {
+    // A preference absent from the store counts as on.
     if (properties.GetBool(preference.key, true)) {
       mSnapFlags |= preference.flag;
     }
   }
+}
+
+EffectControlsKeyframeView::~EffectControlsKeyframeView() = default;
+
+void EffectControlsKeyframeView::DestroySelf() {
+  // The rows may outlive this area: none may keep pointing at it, shown or not.
+  if (const auto list = mList.lock()) {
+    std::function<void(const std::shared_ptr<EffectItem>&)> forget =
+        [&](const std::shared_ptr<EffectItem>& row) {
+          auto* param = dynamic_cast<ParameterControl*>(row.get());
+          if (param != nullptr && param->GetKeyframeViewer() == this) {
+            param->SetKeyframeViewer(nullptr);
+          }
+          for (const auto& child : row->GetItems()) {
+            forget(child);
+          }
+        };
+    const auto forgetAll = [&](const EffectItemList& rows) {
+      for (const auto& row : rows) {
+        forget(row);
+      }
+    };
+    forgetAll(list->GetGraphicsItems());
+    forgetAll(list->GetVideoItems());
+    for (const auto& part : list->GetAudioParts()) {
+      forgetAll(part->GetItems());
+    }
+  }
+  mActor.reset();
+  mToolTip.reset();
+  RemoveListenerFromAllStations(*this);
+  SubView::DestroySelf();
 }
 
 void EffectControlsKeyframeView::SetSnapFlags(unsigned flags) {
@@ -109,8 +101,6 @@ void EffectControlsKeyframeView::SetSnapFlags(unsigned flags) {
   mSnapFlags = stored;
 }
 
-EffectControlsKeyframeView::~EffectControlsKeyframeView() = default;
-
 void EffectControlsKeyframeView::SetTimeline(std::shared_ptr<const PanelTimeline> timeline) {
   if (mTimeline) {
     RemoveListener(mTimeline->GetStation(), *this);
@@ -123,8 +113,15 @@ void EffectControlsKeyframeView::SetTimeline(std::shared_ptr<const PanelTimeline
 }
 
 void EffectControlsKeyframeView::ListenToMessage(const Message& message) {
-  if (message.Is<PanelTimelineChangedMessage>()) {
+  if (const auto* changed = message.As<PanelTimelineChangedMessage>()) {
+    if (changed->Has(PanelTimeline::kEditTimeChanged) && mTimeline) {
+      SetCurrentTime(mTimeline->GetEditTime());
+    }
     Invalidate();
+  } else if (message.Is<RepeatMessage>()) {
+    if (mGesture == Gesture::kMarquee) {
+      AutoScrollMarquee();
+    }
   }
 }
 
@@ -137,6 +134,25 @@ TickTime EffectControlsKeyframeView::GetEditTime() const {
   return mTimeline ? mTimeline->GetEditTime() : 0;
 }
 
+void EffectControlsKeyframeView::SetCurrentTime(TickTime /*time*/) {
+  const auto selection = GetSelection();
+  if (!selection || selection->IsEmpty() || !IsShown() || IsTarget()) {
+    return;
+  }
+  Commander* super = GetSuperCommander();
+  if (super == nullptr || !super->IsOnDuty()) {
+    return;
+  }
+  // Typing in a field of the panel goes on: the keys stay with it.
+  if (const auto* field = dynamic_cast<const HotTextControl*>(&GetTarget());
+      field != nullptr && field->IsEditing()) {
+    return;
+  }
+  BecomeTarget();
+}
+
+// --- Time mapping ---
+
 TickTime EffectControlsKeyframeView::GetVisibleStartTime() const {
   return mTimeline ? mTimeline->GetVisibleStart() : 0;
 }
@@ -145,176 +161,194 @@ double EffectControlsKeyframeView::GetSecondsPerPixel() const {
   return mTimeline ? mTimeline->GetSecondsPerPixel() : 0.0;
 }
 
-double EffectControlsKeyframeView::TimeToX(TickTime time) const {
-  return mTimeline ? mTimeline->TimeToX(time) : 0.0;
+int EffectControlsKeyframeView::TimeToX(TickTime sequenceTime) const {
+  if (!mTimeline) {
+    return 0;
+  }
+  const std::int64_t frames =
+      ToFrame(SubtractTimes(sequenceTime, GetVisibleStartTime()), mTimeline->GetPixelFrameRate());
+  return static_cast<int>(std::clamp<std::int64_t>(frames, -kMaxPixel, kMaxPixel));
 }
 
-TickTime EffectControlsKeyframeView::XToTime(double x) const {
-  return mTimeline ? mTimeline->XToTime(x) : 0;
+TickTime EffectControlsKeyframeView::XToTime(int x) const {
+  if (!mTimeline) {
+    return 0;
+  }
+  const int clamped = std::clamp(x, 0, GetLocalBounds().right);
+  const double ticks =
+      static_cast<double>(clamped) * GetSecondsPerPixel() * static_cast<double>(kTicksPerSecond);
+  return AddTimes(GetVisibleStartTime(), static_cast<TickTime>(std::trunc(ticks)));
+}
+
+TickTime EffectControlsKeyframeView::GetPixelSpan() const {
+  return static_cast<TickTime>(
+      std::trunc(GetSecondsPerPixel() * static_cast<double>(kTicksPerSecond)));
+}
+
+// --- Rows ---
+
+std::vector<EffectControlsKeyframeView::Section> EffectControlsKeyframeView::CollectSections(
+    bool stopBelow) const {
+  std::vector<Section> sections;
+  const auto list = mList.lock();
+  if (!list) {
+    return sections;
+  }
+  const int bottom = GetLocalBounds().bottom;
+  const auto collect = [&](const EffectItemList& rows) {
+    Section section;
+    bool stopped = false;
+    std::function<void(const std::shared_ptr<EffectItem>&)> walk =
+        [&](const std::shared_ptr<EffectItem>& row) {
+          if (stopped || !row->IsShown() || row->IsSetAside()) {
+            return;
+          }
+          if (stopBelow && row->GetTop() > bottom) {
+            stopped = true;
+            return;
+          }
+          section.tracks.push_back(Track{row, dynamic_cast<ParameterControl*>(row.get())});
+          if (row->IsExpanded()) {
+            for (const auto& child : row->GetItems()) {
+              walk(child);
+            }
+          }
+        };
+    for (const auto& row : rows) {
+      walk(row);
+    }
+    if (!section.tracks.empty()) {
+      section.top = section.tracks.front().row->GetTop();
+      section.bottom = section.tracks.back().row->GetTop() + section.tracks.back().row->OwnHeight();
+      for (const Track& track : section.tracks) {
+        section.bottom = std::max(section.bottom, track.row->GetBottom());
+      }
+      sections.push_back(std::move(section));
+    }
+  };
+  if (list->IsGraphicsExpanded()) {
+    collect(list->GetGraphicsItems());
+  }
+  if (list->IsVideoExpanded()) {
+    collect(list->GetVideoItems());
+  }
+  for (const auto& part : list->GetAudioParts()) {
+    if (part->IsClipPart() && part->IsExpanded()) {
+      collect(part->GetItems());
+    }
+  }
+  return sections;
+}
+
+bool EffectControlsKeyframeView::IsKeyframeTrack(const Track& track) {
+  return track.param != nullptr && track.param->GetParam() && track.param->IsTimeVarying();
+}
+
+TrackItemRef EffectControlsKeyframeView::GetClip() const {
+  const auto list = mList.lock();
+  if (!list) {
+    return nullptr;
+  }
+  if (list->GetVideoTrackItem() && list->GetVideoTrackItem()->IsClip()) {
+    return list->GetVideoTrackItem();
+  }
+  for (const auto& part : list->GetAudioParts()) {
+    if (part->IsClipPart()) {
+      return part->GetTrackItem();
+    }
+  }
+  return nullptr;
+}
+
+std::shared_ptr<KeyframeMultiSelection> EffectControlsKeyframeView::GetSelection() const {
+  const auto list = mList.lock();
+  return list ? list->GetKeyframeSelection() : nullptr;
+}
+
+bool EffectControlsKeyframeView::IsReadOnly() const {
+  const auto list = mList.lock();
+  return !list || list->IsReadOnlyEffectContainer();
 }
 
 int EffectControlsKeyframeView::GetSelectedKeyframeCount() const {
-  const auto list = mList.lock();
-  if (!list || !list->GetKeyframeSelection()) {
-    return 0;
-  }
-  return static_cast<int>(list->GetKeyframeSelection()->GetKeyframeCount());
-}
-
-bool EffectControlsKeyframeView::FindCommandStatus(CommandID command, CommandStatus& status) {
-  if (command == kCommandClear) {
-    status.enabled = GetSelectedKeyframeCount() > 0;
-    return true;
-  }
-  return SubView::FindCommandStatus(command, status);
-}
-
-bool EffectControlsKeyframeView::ObeyCommand(CommandID command) {
-  if (command == kCommandClear) {
-    DeleteSelectedKeyframes();
-    return true;
-  }
-  return SubView::ObeyCommand(command);
-}
-
-void EffectControlsKeyframeView::DeleteSelectedKeyframes() {
-  const auto list = mList.lock();
-  if (!list || !list->GetKeyframeSelection() || list->GetKeyframeSelection()->IsEmpty()) {
-    return;
-  }
-  // The selection is the list's and may be replaced by the rebuild an edit causes: keep it.
-  const std::shared_ptr<KeyframeMultiSelection> selection = list->GetKeyframeSelection();
-  if (selection->RemoveSelectionFromComponentParams() == EditStatus::Done) {
-    selection->Clear();
-    Invalidate();
-  }
-}
-
-void EffectControlsKeyframeView::PaintSelf(DC& dc) {
-  const Rect bounds = GetLocalBounds();
-  const Color background =
-      PanelColor("colors.effectscontrols.keyframeview.background", kColor_ContentBackground);
-  const Color noClip =
-      PanelColor("colors.effectscontrols.keyframeview.noclipband", kColor_WindowBackground);
-  const Color separator =
-      PanelColor("colors.effectscontrols.keyframeview.Hseparator", kColor_ListBoxContentDivider);
-  const Color band =
-      PanelColor("colors.effectscontrols.keyframeview.trimband", kColor_ControlBackground);
-  const Color filterBackground =
-      PanelColor("colors.effectscontrols.keyframeview.filteritembkgd", kColor_ListBoxContentNormal);
-  dc.FillRect(bounds, noClip);
-
-  const auto list = mList.lock();
-  if (!list || !mTimeline || !(GetSecondsPerPixel() > 0.0)) {
-    return;
-  }
-  // The clip's span is the area's working background; outside it the no-clip colour shows.
-  const int clipLeft =
-      std::max(0, static_cast<int>(std::floor(TimeToX(mTimeline->GetShownStart()))));
-  const int clipRight =
-      std::min(bounds.Width(), static_cast<int>(std::ceil(TimeToX(mTimeline->GetShownEnd()))));
-  if (clipRight > clipLeft) {
-    dc.FillRect(Rect{clipLeft, 0, clipRight, bounds.Height()}, background);
-  }
-
-  const auto draw = [&](const std::shared_ptr<EffectItem>& row) {
-    if (!row->IsShown() || row->IsSetAside()) {
-      return;
-    }
-    const int top = row->GetTop();
-    const int height = row->Height();
-    if (top + height < 0 || top > bounds.Height()) {
-      return;
-    }
-    if (row->IsFilter()) {
-      // The effect's band: where the clip lies, across the effect's own title row.
-      if (clipRight > clipLeft) {
-        dc.FillRect(Rect{clipLeft, top + 1, clipRight, top + row->OwnHeight() - 1}, band);
-      }
-    } else if (row->IsFolder()) {
-      dc.FillRect(Rect{0, top, bounds.Width(), top + row->OwnHeight()}, filterBackground);
-    }
-    dc.FillRect(Rect{0, top + row->OwnHeight() - 1, bounds.Width(), top + row->OwnHeight()},
-                separator);
-
-    VisitGlyphs(*list, row, [&](const KeyframeGlyph& glyph) {
-      const int index = 6 * glyph.kind + (glyph.selected ? 3 : 0);
-      const Point at{glyph.centre.x - 7, glyph.centre.y - 8};
-      if (mImages && index < mImages->GetCount()) {
-        mImages->Draw(dc, index, at);
-      } else {
-        dc.DrawBitmap(*Bitmap::GetBitmap(static_cast<Decal>(index)), at);
-      }
-    });
-  };
-  VisitRows(list->GetVideoItems(), draw);
-  VisitRows(list->GetGraphicsItems(), draw);
-  for (const auto& part : list->GetAudioParts()) {
-    VisitRows(part->GetItems(), draw);
-  }
-
-  // The current time across every track.
-  const int x = static_cast<int>(std::lround(TimeToX(mTimeline->GetEditTime())));
-  if (x >= 0 && x < bounds.Width()) {
-    dc.FillRect(Rect{x, 0, x + 1, bounds.Height()},
-                ColorManager::GetColor(kColor_CurrentTimeIndicator));
-  }
-}
-
-void EffectControlsKeyframeView::VisitGlyphs(
-    const EffectControlsListView& list, const std::shared_ptr<EffectItem>& row,
-    const std::function<void(const KeyframeGlyph&)>& visit) const {
-  const auto* control = dynamic_cast<const ParameterControl*>(row.get());
-  if (control == nullptr || !control->GetParam() || !control->GetParam()->IsTimeVarying()) {
-    return;
-  }
-  const int width = GetLocalBounds().Width();
-  const auto& selection = list.GetKeyframeSelection();
-  const auto& keys = control->GetParam()->GetKeyframes().Keyframes();
-  const int centreY = row->GetTop() + row->OwnHeight() / 2;
-  for (const auto& key : keys) {
-    const ClipTime clipTime(key.time);
-    const TickTime sequenceTime = control->GetTrackItem()
-                                      ? control->ClipTimeToSequenceTime(clipTime).Ticks()
-                                      : list.ClipTimeToSequenceTime(clipTime).Ticks();
-    const int x = static_cast<int>(std::lround(TimeToX(sequenceTime)));
-    if (x < -8 || x > width + 8) {
-      continue;
-    }
-    visit(KeyframeGlyph{
-        .row = control,
-        .clipTime = key.time,
-        .centre = Point{x, centreY},
-        .selected = selection && selection->Contains(control->GetParam().get(), key.time),
-        .kind = GlyphKind(key.interpolation),
-    });
-  }
+  const auto selection = GetSelection();
+  return selection ? static_cast<int>(selection->GetKeyframeCount()) : 0;
 }
 
 std::vector<EffectControlsKeyframeView::KeyframeGlyph>
 EffectControlsKeyframeView::GetKeyframeGlyphs() const {
   std::vector<KeyframeGlyph> glyphs;
-  const auto list = mList.lock();
-  if (!list || !mTimeline || !(GetSecondsPerPixel() > 0.0)) {
+  if (!mTimeline || !(GetSecondsPerPixel() > 0.0)) {
     return glyphs;
   }
-  const int height = GetLocalBounds().Height();
-  const auto collect = [&](const std::shared_ptr<EffectItem>& row) {
-    if (!row->IsShown() || row->IsSetAside() || row->GetTop() + row->Height() < 0 ||
-        row->GetTop() > height) {
-      return;
+  const auto selection = GetSelection();
+  const int width = GetLocalBounds().Width();
+  for (const Section& section : CollectSections(true)) {
+    for (const Track& track : section.tracks) {
+      if (!IsKeyframeTrack(track) || track.row->GetBottom() < 0) {
+        continue;
+      }
+      const int centreY = track.row->GetTop() + ParameterControl::kKeyframeStripHeight / 2;
+      for (const TickTime time : track.param->GetParam()->GetKeyframeTimes()) {
+        const int x = TimeToX(track.param->ClipTimeToSequenceTime(ClipTime(time)).Ticks());
+        if (x < -8 || x > width + 8) {
+          continue;
+        }
+        glyphs.push_back(KeyframeGlyph{
+            .row = track.param,
+            .clipTime = time,
+            .centre = Point{x, centreY},
+            .selected = selection && selection->Contains(track.param->GetParam().get(), time),
+        });
+      }
     }
-    VisitGlyphs(*list, row, [&glyphs](const KeyframeGlyph& glyph) { glyphs.push_back(glyph); });
-  };
-  VisitRows(list->GetVideoItems(), collect);
-  VisitRows(list->GetGraphicsItems(), collect);
-  for (const auto& part : list->GetAudioParts()) {
-    VisitRows(part->GetItems(), collect);
   }
   return glyphs;
 }
 
-// --- Separator ---
+std::set<TickTime> EffectControlsKeyframeView::CollectKeyframeTimes() const {
+  std::set<TickTime> times;
+  for (const Section& section : CollectSections(false)) {
+    for (const Track& track : section.tracks) {
+      if (IsKeyframeTrack(track)) {
+        track.param->GetKeyframeTimes(times, TimeLine::kSequence);
+      }
+    }
+  }
+  return times;
+}
+
+std::optional<TickTime> EffectControlsKeyframeView::NavigateKeyframe(bool forward) {
+  const std::set<TickTime> times = CollectKeyframeTimes();
+  const TickTime now = GetEditTime();
+  std::optional<TickTime> found;
+  if (forward) {
+    if (const auto it = times.upper_bound(now); it != times.end()) {
+      found = *it;
+    }
+  } else if (const auto it = times.lower_bound(now); it != times.begin()) {
+    found = *std::prev(it);
+  }
+  const auto selection = GetSelection();
+  if (!found || !selection) {
+    return found;
+  }
+  selection->Clear();
+  for (const Section& section : CollectSections(false)) {
+    for (const Track& track : section.tracks) {
+      if (!IsKeyframeTrack(track)) {
+        continue;
+      }
+      const TickTime clipTime = track.param->SequenceTimeToClipTime(SequenceTime(*found)).Ticks();
+      selection->AddItem(track.param->GetTrackItem(), track.param->GetComponent(),
+                         track.param->GetParam(), clipTime);
+    }
+  }
+  Invalidate();
+  return found;
+}
+
+// --- Separator and announcements ---
 
 void EffectControlsKeyframeView::ReportSeparator(Point point) const {
   const auto list = mList.lock();
@@ -327,32 +361,8 @@ void EffectControlsKeyframeView::ReportSeparator(Point point) const {
                    EffectControlsListSeparatorMoved(Point{xInList, point.y}));
 }
 
-void EffectControlsKeyframeView::LeftButtonDownSelf(Point point, KeyModifiers /*modifiers*/) {
-  if (point.x < kSeparatorGrabWidth) {
-    mDraggingSeparator = true;
-    CaptureMouse();
+void EffectControlsKeyframeView::AnnounceDragTime(std::optional<TickTime> time) const {
+  if (const auto list = mList.lock()) {
+    BroadcastMessage(list->GetKeyframeViewStation(), EffectControlsKeyframeDragTimeMessage(time));
   }
-}
-
-void EffectControlsKeyframeView::MouseMoveSelf(Point point, KeyModifiers /*modifiers*/) {
-  if (mDraggingSeparator) {
-    ReportSeparator(point);
-  }
-}
-
-void EffectControlsKeyframeView::LeftButtonUpSelf(Point point, KeyModifiers /*modifiers*/) {
-  if (mDraggingSeparator) {
-    // The report moves this view: the last one comes from the release point.
-    mDraggingSeparator = false;
-    ReleaseMouse();
-    ReportSeparator(point);
-  }
-}
-
-bool EffectControlsKeyframeView::SetCursorSelf(Point point, KeyModifiers /*modifiers*/) {
-  if (mDraggingSeparator || point.x < kSeparatorGrabWidth) {
-    SetCurrentCursor(Cursor::kSplitterHorizontal);
-    return true;
-  }
-  return false;
 }

@@ -505,6 +505,14 @@ void EffectControlsView::FillStateDump(PanelStateDump& dump) const {
   dump.extra.emplace_back("listTop", static_cast<std::int64_t>(list.top));
   dump.extra.emplace_back("listWidth", static_cast<std::int64_t>(list.Width()));
   dump.extra.emplace_back("toolMode", std::string(ToolModeName(mToolMode)));
+  // Where the keyframe area lies and where the edit line crosses it, so a script can turn a
+  // time into a drop point.
+  const Rect keyframes = mKeyframeView->GetBounds();
+  dump.extra.emplace_back("keyframeAreaLeft", static_cast<std::int64_t>(keyframes.left));
+  dump.extra.emplace_back("keyframeAreaTop", static_cast<std::int64_t>(keyframes.top));
+  dump.extra.emplace_back(
+      "currentTimeX",
+      static_cast<std::int64_t>(keyframes.left + mKeyframeView->TimeToX(mTimeline->GetEditTime())));
   const DirectManipulationManager* manager = mListView->GetDirectManipulationManager();
   const ComponentRef onScreen =
       manager != nullptr && manager->AreControlsShown() ? manager->GetFilter() : nullptr;

@@ -273,6 +273,16 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
       }
       status.enabled = status.enabled && editable;
       return true;
+    case kCommandCut:
+    case kCommandCopy:
+      if (!mListView->FindCommandStatus(command, status) || !status.enabled) {
+        status = CommandStatus{};
+        mKeyframeView->FindCommandStatus(command, status);
+      }
+      if (command == kCommandCut) {
+        status.enabled = status.enabled && editable;
+      }
+      return true;
     case kKeyframeAreaCommand:
       if (!mKeyframeView->FindCommandStatus(command, status)) {
         status = CommandStatus{};
@@ -294,6 +304,9 @@ bool EffectControlsView::FindCommandStatus(CommandID command, CommandStatus& sta
             editable && ResetCapsuleParameters(
                             static_cast<std::size_t>(command - kFirstCapsuleResetCommand), false);
         return true;
+      }
+      if (EffectControlsKeyframeView::IsKeyframeCommand(command)) {
+        return mKeyframeView->FindCommandStatus(command, status);
       }
       break;
   }
@@ -392,6 +405,13 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
         mKeyframeView->ObeyCommand(command);
       }
       return true;
+    case kCommandCut:
+    case kCommandCopy:
+      // Effects first, else keyframes.
+      if (!mListView->ObeyCommand(command)) {
+        mKeyframeView->ObeyCommand(command);
+      }
+      return true;
     case kKeyframeAreaCommand:
       mKeyframeView->ObeyCommand(command);
       return true;
@@ -408,6 +428,9 @@ bool EffectControlsView::ObeyCommand(CommandID command) {
         return true;
       }
       break;
+  }
+  if (EffectControlsKeyframeView::IsKeyframeCommand(command)) {
+    return mKeyframeView->ObeyCommand(command);
   }
   if (IsNavigationCommand(command)) {
     OnNavigationCommand(command);

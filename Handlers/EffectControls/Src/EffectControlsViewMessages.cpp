@@ -208,6 +208,9 @@ void EffectControlsView::ListenToMessage(const Message& message) {
     OnSeparatorMoved(separator->point.x + mListView->GetBounds().left);
   } else if (const auto* autoScroll = message.As<EffectControlsAutoScrollMessage>()) {
     ScrollVisibleTime(autoScroll->amount);
+  } else if (const auto* dragTime = message.As<EffectControlsKeyframeDragTimeMessage>()) {
+    // The ruler follows the dragged keyframes, then goes back to the edit line.
+    mRuler->SetCurrentTime(dragTime->time.value_or(mTimeline->GetEditTime()));
   } else if (const auto* become = message.As<EffectControlsBecomeTargetMessage>()) {
     if (become->recomputeZoomRange && mSequence && mTargetMode != kTargetNone) {
       SetupTimeBarZoomMinMax(mListView->GetTarget().selection);

@@ -1,5 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <cstdint>
+#include <optional>
 #include <set>
 #include <string>
 #include <vector>
@@ -388,3 +391,45 @@ TEST_F(TimeRemappingGlyphTest, ARowCanTakeItsWidthFromTheListView) {
 }
 
 }  // namespace
+
+// The hit test searches for the first keyframe in reach instead of scanning from the start; it
+// must find what a scan finds, keyframes closer together than the tolerance included.
+TEST_F(ParameterControlTest, TheKeyframeHitTestFindsWhatAScanOfEveryKeyframeFinds) {
+  auto row = MakeRow<PlainRow>(opacity);
+  std::uint32_t state = 99;
+  const auto next = [&state](std::uint32_t range) {
+    state = state * 1664525u + 1013904223u;
+    return (state >> 8) % range;
+  };
+  TickTime time = 0;
+  for (int i = 0; i < 300; ++i) {
+    time += static_cast<TickTime>(1 + next(40)) * (kSecond / 100);
+    ComponentParamActions::AddKeyframe(opacity, time, 50.0);
+  }
+  const auto scan = [&](Point point, TickTime origin,
+                        const FrameRate& rate) -> std::optional<TickTime> {
+    for (const TickTime clipTime : opacity->GetKeyframeTimes()) {
+      const TickTime at = row->ClipTimeToSequenceTime(ClipTime(clipTime)).Ticks();
+      const std::int64_t x = std::clamp<std::int64_t>(ToFrame(at - origin, rate), -65536, 65536);
+      if (x - ParameterControl::kKeyframeHitTolerance < point.x &&
+          point.x < x + ParameterControl::kKeyframeHitTolerance && at >= 0) {
+        return at;
+      }
+    }
+    return std::nullopt;
+  };
+  for (const TickTime perPixel : {kSecond / 100, kSecond / 7, kSecond / 1000}) {
+    const FrameRate rate = *FrameRate::FromTicksPerFrame(perPixel);
+    for (const TickTime origin : {TickTime{0}, -3 * kSecond, 7 * kSecond + 13}) {
+      for (int x = -20; x < 900; x += 3) {
+        TickTime hit = -1;
+        const bool found = row->HitKeyframe({x, 5}, origin, rate, hit);
+        const std::optional<TickTime> expected = scan({x, 5}, origin, rate);
+        ASSERT_EQ(found, expected.has_value()) << x << " " << origin << " " << perPixel;
+        if (found) {
+          EXPECT_EQ(hit, *expected) << x << " " << origin << " " << perPixel;
+        }
+      }
+    }
+  }
+}

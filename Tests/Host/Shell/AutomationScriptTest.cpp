@@ -145,3 +145,17 @@ TEST(AutomationScript, AMissingFileIsAnErrorNotACrash) {
 }
 
 }  // namespace
+
+TEST(AutomationScript, PressAndReleaseTakeAPointAndModifiers) {
+  const auto parsed = AutomationScript::Parse("press 10 20 shift\nmove 30 20\nrelease 30 20\n");
+  ASSERT_TRUE(std::holds_alternative<AutomationScript>(parsed));
+  const auto& commands = std::get<AutomationScript>(parsed).Commands();
+  ASSERT_EQ(commands.size(), 3u);
+  EXPECT_EQ(commands[0].verb, ScriptVerb::kPress);
+  EXPECT_EQ(commands[0].numbers, (std::vector<int>{10, 20}));
+  EXPECT_EQ(commands[0].modifiers, kScriptShift);
+  EXPECT_EQ(commands[2].verb, ScriptVerb::kRelease);
+  EXPECT_EQ(commands[2].numbers, (std::vector<int>{30, 20}));
+  EXPECT_FALSE(std::holds_alternative<AutomationScript>(AutomationScript::Parse("press 10")));
+  EXPECT_FALSE(std::holds_alternative<AutomationScript>(AutomationScript::Parse("release a b")));
+}
