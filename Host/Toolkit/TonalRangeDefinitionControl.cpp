@@ -21,6 +21,7 @@ TonalRangeDefinitionControl::TonalRangeDefinitionControl(const Rect& bounds, dou
                                                          double maximum, Commander* commander)
     : SubView(commander), mMinimum(minimum), mMaximum(std::max(minimum, maximum)) {
   SetBounds(bounds);
+  SetTakesFocusOnClick(true);
   mValues = Ordered({minimum, 0.0, mMaximum, 0.0});
 }
 
@@ -198,6 +199,7 @@ void TonalRangeDefinitionControl::LeftButtonDownSelf(Point point, KeyModifiers /
   if (!mDragged) {
     return;
   }
+  mKeyHandle = mDragged;
   mGrabValue = LocalToValue(point.x);
   mGrabValues = mValues;
   mMoved = false;
@@ -230,6 +232,27 @@ void TonalRangeDefinitionControl::LeftButtonUpSelf(Point /*point*/, KeyModifiers
   }
   mDragged.reset();
   mMoved = false;
+}
+
+bool TonalRangeDefinitionControl::KeyDownSelf(const KeyEvent& event) {
+  if (mDragged || !IsEnabledInTree() ||
+      (event.key != KeyCode::kLeft && event.key != KeyCode::kRight)) {
+    return SubView::KeyDownSelf(event);
+  }
+  const double step =
+      (IsShiftDown(event.modifiers) ? 10.0 : 1.0) * (event.key == KeyCode::kLeft ? -1.0 : 1.0);
+  mDragged = mKeyHandle.value_or(Handle::kShadowThreshold);
+  mGrabValues = mValues;
+  const TonalRangeDefinitionValues v = Dragged(step, false);
+  if (v.shadowThreshold != mValues.shadowThreshold || v.shadowSoftness != mValues.shadowSoftness ||
+      v.highlightThreshold != mValues.highlightThreshold ||
+      v.highlightSoftness != mValues.highlightSoftness) {
+    mValues = v;
+    Invalidate();
+    Report(true);
+  }
+  mDragged.reset();
+  return true;
 }
 
 void TonalRangeDefinitionControl::HideSelf() {

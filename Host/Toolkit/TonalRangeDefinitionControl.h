@@ -49,7 +49,9 @@ EC_TONAL_RANGE_PAIR(ShadowAndHighlightThresholdAndHighlightSoftness)
 // put, so both change) and pushes the other threshold along when it would pass it; dragging a
 // softness handle changes that softness; pressing on the bar between the thresholds moves both.
 // Each step is reported with the changing message that names what moved since the press, the
-// release with the matching changed message. SetValues sends nothing. UI thread only.
+// release with the matching changed message. Keys, while focused: Left and Right move the last
+// pressed handle (the shadow threshold before any) by one unit, Shift by ten, each as one
+// finished change. SetValues sends nothing. UI thread only.
 class TonalRangeDefinitionControl : public SubView {
  public:
   enum class Handle {
@@ -82,6 +84,7 @@ class TonalRangeDefinitionControl : public SubView {
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
   void MouseMoveSelf(Point point, KeyModifiers modifiers) override;
   void LeftButtonUpSelf(Point point, KeyModifiers modifiers) override;
+  bool KeyDownSelf(const KeyEvent& event) override;
   void HideSelf() override;
   void PaintSelf(DC& dc) override;
 
@@ -97,6 +100,7 @@ class TonalRangeDefinitionControl : public SubView {
   std::int32_t mCookie = 0;
   TonalRangeDefinitionValues mValues;
   std::optional<Handle> mDragged;
+  std::optional<Handle> mKeyHandle;  // what the keys move: the last handle pressed
   double mGrabValue = 0.0;
   TonalRangeDefinitionValues mGrabValues;
   bool mMoved = false;

@@ -90,4 +90,14 @@ TEST_F(TonalRangeDefinitionControlTest, ANarrowControlTakesNoDrag) {
   EXPECT_EQ(tiny->LocalToValue(0), 0.0);
 }
 
+TEST_F(TonalRangeDefinitionControlTest, KeysMoveTheLastPressedHandleAsFinishedChanges) {
+  Click(Handle(75.0));
+  Key(KeyCode::kRight, kKeyModifierShift);
+  Key(KeyCode::kLeft);
+  EXPECT_EQ(Values(), "25 10 84 10");
+  EXPECT_EQ(recorder.lines, (std::vector<std::string>{
+                                "TonalRangeDefinitionControlHighlightThresholdChangedMessage",
+                                "TonalRangeDefinitionControlHighlightThresholdChangedMessage"}));
+}
+
 }  // namespace
