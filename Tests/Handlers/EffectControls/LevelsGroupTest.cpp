@@ -192,4 +192,35 @@ TEST_F(LevelsGroupTest, OnANarrowListNoSizeGoesBelowZero) {
   EXPECT_GE(group->Height(), 0);
 }
 
+// Rows and their controls, recursively: nothing of the colour groups may go below zero in a
+// small panel.
+void ExpectNoNegativeSize(const EffectItem& row) {
+  EXPECT_GE(row.Height(), 0) << row.GetName();
+  for (const auto& control : row.GetControls()) {
+    EXPECT_GE(control->GetBounds().Width(), 0) << row.GetName();
+    EXPECT_GE(control->GetBounds().Height(), 0) << row.GetName();
+  }
+  for (const auto& child : row.GetItems()) {
+    ExpectNoNegativeSize(*child);
+  }
+}
+
+TEST_F(ListViewTest, APanel200By300LaysOutTheColourGroupsWithNoNegativeSize) {
+  const TrackItemRef clip = AddClip(
+      v1, {Make(kMatchName_Levels), Make(kMatchName_TonalRange), Make(kMatchName_SaturationRange),
+           Make(kMatchName_LumaRange), Make(kMatchName_HueRange), Make(kMatchName_LumaCurve),
+           Make(kMatchName_RGBCurves), Make(kMatchName_ThreeWayColor)});
+  Open({200, 300});
+  Select({clip});
+  ASSERT_FALSE(list->GetVideoItems().empty());
+  for (const auto& effect : list->GetVideoItems()) {
+    effect->SetAllExpanded(true);
+  }
+  list->PositionItems();
+  host->Render();
+  for (const auto& effect : list->GetVideoItems()) {
+    ExpectNoNegativeSize(*effect);
+  }
+}
+
 }  // namespace
