@@ -173,6 +173,14 @@ ProjectRef BuildDemo() {
   setParam(threeWay, "Shadows Magnitude", 25.0);
   setParam(threeWay, "Highlights Angle", 40.0);
   setParam(threeWay, "Highlights Magnitude", 15.0);
+  // Appended later, so that the objects above keep their ids: levels with a line of auto
+  // buttons, the saturation and luma ranges and a tonal range.
+  auto levels = b.AddEffect(gradeClip, kMatchName_Levels);
+  b.AddEffect(gradeClip, kMatchName_SaturationRange);
+  b.AddEffect(gradeClip, kMatchName_LumaRange);
+  b.AddEffect(gradeClip, kMatchName_TonalRange);
+  setParam(levels, "Input White Level", 235.0);
+  setParam(levels, "Output Black Level", 10.0);
 
   Markers markers;
   markers.Add({Seconds(4), 0, "Cut here?", "", 1});

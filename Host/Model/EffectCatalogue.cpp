@@ -355,18 +355,95 @@ ComponentRef HueRange() {
   return effect;
 }
 
+// A saturation or luma range in percent, laid out as the hue range.
+ComponentRef PercentRange(const char* matchName, const char* name, GroupKind kind) {
+  ComponentRef effect = MakeEffect(matchName, name, MediaType::Video, false);
+  effect->AddParam(Group(name, kind));
+  effect->AddParam(Check("Show Range", false));
+  const std::pair<const char*, double> handles[] = {{"Start Threshold", 30.0},
+                                                    {"Start Softness", 10.0},
+                                                    {"End Threshold", 70.0},
+                                                    {"End Softness", 20.0}};
+  for (const auto& [handle, value] : handles) {
+    effect->AddParam(
+        Scalar(handle, value, 0.0, 100.0, 1, ParamUnits::Percent, ParamType::DoubleSlider));
+  }
+  effect->AddParam(GroupEnd());
+  return effect;
+}
+
+// Shadows and highlights of a tonal range in percent, each with a soft edge.
+ComponentRef TonalRange() {
+  ComponentRef effect = MakeEffect(kMatchName_TonalRange, "Tonal Range", MediaType::Video, false);
+  effect->AddParam(Group("Tonal Range", GroupKind::TonalRangeDefinition));
+  const std::pair<const char*, double> handles[] = {{"Shadow Threshold", 25.0},
+                                                    {"Shadow Softness", 10.0},
+                                                    {"Highlight Threshold", 75.0},
+                                                    {"Highlight Softness", 10.0}};
+  for (const auto& [handle, value] : handles) {
+    effect->AddParam(
+        Scalar(handle, value, 0.0, 100.0, 1, ParamUnits::Percent, ParamType::DoubleSlider));
+  }
+  effect->AddParam(GroupEnd());
+  return effect;
+}
+
+// Input black, gray and white and output black and white, levels 0 to 255, shown through the
+// group's own controls and fields; then a line of buttons that set the levels automatically.
+ComponentRef Levels() {
+  ComponentRef effect = MakeEffect(kMatchName_Levels, "Levels", MediaType::Video, false);
+  effect->SetCanTakeMasks(true);
+  effect->AddParam(Group("Levels", GroupKind::Levels));
+  const std::pair<const char*, double> levels[] = {{"Input Black Level", 0.0},
+                                                   {"Input Gray Level", 128.0},
+                                                   {"Input White Level", 255.0},
+                                                   {"Output Black Level", 0.0},
+                                                   {"Output White Level", 255.0}};
+  for (const auto& [name, value] : levels) {
+    ComponentParamRef level =
+        Scalar(name, value, 0.0, 255.0, 0, ParamUnits::None, ParamType::DoubleSlider);
+    level->SetVisible(false);
+    effect->AddParam(std::move(level));
+  }
+  effect->AddParam(GroupEnd());
+  effect->AddParam(Group("Auto Levels", GroupKind::Buttons));
+  for (const char* name : {"Auto Black Level", "Auto Contrast", "Auto White Level"}) {
+    effect->AddParam(ComponentParam::Create(name, ParamType::Button, false)
+                         ->SetCheckboxDisplayName(name)
+                         ->SetCanVaryOverTime(false));
+  }
+  effect->AddParam(GroupEnd());
+  return effect;
+}
+
 EffectCatalogue MakeStandard() {
   EffectCatalogue catalogue;
-  for (ComponentRef effect : {Motion(),         Opacity(),
-                              TimeRemapping(),  Volume(),
-                              ChannelVolume(),  Panner(),
-                              GaussianBlur(),   BrightnessContrast(),
-                              Crop(),           Tint(),
-                              Timecode(),       GridDistortion(),
-                              Delay(),          Mask(),
-                              MatteFromTrack(), LumaCurve(),
-                              RGBCurves(),      ColorBalanceWheel(),
-                              ThreeWayColor(),  HueRange()}) {
+  for (ComponentRef effect :
+       {Motion(),
+        Opacity(),
+        TimeRemapping(),
+        Volume(),
+        ChannelVolume(),
+        Panner(),
+        GaussianBlur(),
+        BrightnessContrast(),
+        Crop(),
+        Tint(),
+        Timecode(),
+        GridDistortion(),
+        Delay(),
+        Mask(),
+        MatteFromTrack(),
+        LumaCurve(),
+        RGBCurves(),
+        ColorBalanceWheel(),
+        ThreeWayColor(),
+        HueRange(),
+        Levels(),
+        PercentRange(kMatchName_SaturationRange, "Saturation Range",
+                     GroupKind::SaturationRangeDefinition),
+        PercentRange(kMatchName_LumaRange, "Luma Range", GroupKind::LumaRangeDefinition),
+        TonalRange()}) {
     catalogue.Register(std::move(effect));
   }
   DescribeAudioParams(catalogue);

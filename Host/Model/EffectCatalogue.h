@@ -30,6 +30,10 @@ inline constexpr const char* kMatchName_RGBCurves = "XO.KRVN RGBCurves";
 inline constexpr const char* kMatchName_ColorBalanceWheel = "XO.KRVN ColorBalanceWheel";
 inline constexpr const char* kMatchName_ThreeWayColor = "XO.KRVN ThreeWayColor";
 inline constexpr const char* kMatchName_HueRange = "XO.KRVN HueRange";
+inline constexpr const char* kMatchName_Levels = "XO.KRVN Levels";
+inline constexpr const char* kMatchName_SaturationRange = "XO.KRVN SaturationRange";
+inline constexpr const char* kMatchName_LumaRange = "XO.KRVN LumaRange";
+inline constexpr const char* kMatchName_TonalRange = "XO.KRVN TonalRange";
 
 // Positions (from 0) of the mask parameters the tracker works with.
 inline constexpr std::size_t kMaskParamPath = 6;

@@ -7,11 +7,13 @@
 
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/DC.h"
+#include "Host/Toolkit/KeyModifiers.h"
 
 HSLRangeDefinitionControl::HSLRangeDefinitionControl(const Rect& bounds, double minimum,
                                                      double maximum, Commander* commander)
     : SubView(commander), mMinimum(minimum), mMaximum(std::max(minimum, maximum)) {
   SetBounds(bounds);
+  SetTakesFocusOnClick(true);
   mValues = Ordered({minimum, minimum, mMaximum, 0.0});
 }
 
@@ -127,17 +129,14 @@ void HSLRangeDefinitionControl::LeftButtonDownSelf(Point point, KeyModifiers /*m
   if (!mDragged) {
     return;
   }
+  mKeyHandle = mDragged;
   mGrabValue = LocalToValue(point.x);
   mGrabValues = mValues;
   mMoved = false;
   CaptureMouse();
 }
 
-void HSLRangeDefinitionControl::MouseMoveSelf(Point point, KeyModifiers /*modifiers*/) {
-  if (!mDragged) {
-    return;
-  }
-  const double delta = LocalToValue(point.x) - mGrabValue;
+HSLRangeDefinitionValues HSLRangeDefinitionControl::Dragged(double delta) const {
   HSLRangeDefinitionValues v = mGrabValues;
   const double endSoftnessAt = mMaximum - v.endSoftness;
   switch (*mDragged) {
@@ -161,11 +160,25 @@ void HSLRangeDefinitionControl::MouseMoveSelf(Point point, KeyModifiers /*modifi
       break;
     }
   }
-  if (v.startSoftness != mValues.startSoftness || v.startThreshold != mValues.startThreshold ||
-      v.endThreshold != mValues.endThreshold || v.endSoftness != mValues.endSoftness) {
-    mValues = v;
+  return v;
+}
+
+bool HSLRangeDefinitionControl::Take(const HSLRangeDefinitionValues& v) {
+  if (v.startSoftness == mValues.startSoftness && v.startThreshold == mValues.startThreshold &&
+      v.endThreshold == mValues.endThreshold && v.endSoftness == mValues.endSoftness) {
+    return false;
+  }
+  mValues = v;
+  Invalidate();
+  return true;
+}
+
+void HSLRangeDefinitionControl::MouseMoveSelf(Point point, KeyModifiers /*modifiers*/) {
+  if (!mDragged) {
+    return;
+  }
+  if (Take(Dragged(LocalToValue(point.x) - mGrabValue))) {
     mMoved = true;
-    Invalidate();
     Report(false);
   }
 }
@@ -180,6 +193,22 @@ void HSLRangeDefinitionControl::LeftButtonUpSelf(Point /*point*/, KeyModifiers /
   }
   mDragged.reset();
   mMoved = false;
+}
+
+bool HSLRangeDefinitionControl::KeyDownSelf(const KeyEvent& event) {
+  if (mDragged || !IsEnabledInTree() ||
+      (event.key != KeyCode::kLeft && event.key != KeyCode::kRight)) {
+    return SubView::KeyDownSelf(event);
+  }
+  const double step =
+      (IsShiftDown(event.modifiers) ? 10.0 : 1.0) * (event.key == KeyCode::kLeft ? -1.0 : 1.0);
+  mDragged = mKeyHandle.value_or(Handle::kStartThreshold);
+  mGrabValues = mValues;
+  if (Take(Dragged(step))) {
+    Report(true);
+  }
+  mDragged.reset();
+  return true;
 }
 
 void HSLRangeDefinitionControl::HideSelf() {

@@ -40,7 +40,9 @@ EC_HSL_RANGE_MESSAGE(HSLRangeDefinitionControlStartEndThresholdChangedQuickMessa
 // maximum - end softness. Dragging a handle moves it, clamped between its neighbours; pressing
 // on the bar between the thresholds moves both thresholds together, clamped by the softness
 // handles. Each step is reported with the changing message of what moved, the release with the
-// changed one. SetValues sends nothing. UI thread only.
+// changed one. Keys, while focused: Left and Right move the last pressed handle (the start
+// threshold before any) by one unit, Shift by ten, each as one finished change. SetValues sends
+// nothing. UI thread only.
 class HSLRangeDefinitionControl : public SubView {
  public:
   enum class Handle { kStartSoftness, kStartThreshold, kEndThreshold, kEndSoftness, kThresholds };
@@ -67,12 +69,17 @@ class HSLRangeDefinitionControl : public SubView {
   void LeftButtonDownSelf(Point point, KeyModifiers modifiers) override;
   void MouseMoveSelf(Point point, KeyModifiers modifiers) override;
   void LeftButtonUpSelf(Point point, KeyModifiers modifiers) override;
+  bool KeyDownSelf(const KeyEvent& event) override;
   void HideSelf() override;
   void PaintSelf(DC& dc) override;
 
  private:
   HSLRangeDefinitionValues Ordered(HSLRangeDefinitionValues v) const;
   std::optional<Handle> HitHandle(Point point) const;
+  // The grabbed values with the dragged handle moved by `delta`, kept in order.
+  HSLRangeDefinitionValues Dragged(double delta) const;
+  // Takes the values; true when they differ from the shown ones.
+  bool Take(const HSLRangeDefinitionValues& values);
   void Report(bool finished) const;
 
   ControlStation mStation{"HSLRangeDefinitionControl"};
@@ -81,7 +88,8 @@ class HSLRangeDefinitionControl : public SubView {
   std::int32_t mCookie = 0;
   HSLRangeDefinitionValues mValues;
   std::optional<Handle> mDragged;
-  double mGrabValue = 0.0;  // the value under the pointer when the drag began
+  std::optional<Handle> mKeyHandle;  // what the keys move: the last handle pressed
+  double mGrabValue = 0.0;           // the value under the pointer when the drag began
   HSLRangeDefinitionValues mGrabValues;
   bool mMoved = false;
 };

@@ -12,16 +12,35 @@ int ButtonParameter::OwnHeight() const {
 }
 
 void ButtonParameter::PositionSelf(int top, int depth, int width) {
+  mInLine = false;
   ParameterControl::PositionSelf(top, depth, width);
+  PlaceButton(GetParameterIndentInPixels() + width / 2 - 20, width);
+}
+
+void ButtonParameter::PositionInLine(int top, int depth, int width, int left) {
+  ParameterControl::PositionSelf(top, depth, width);
+  mInLine = true;
+  PlaceButton(left, width);
+}
+
+int ButtonParameter::GetPreferredButtonWidth() const {
+  const int label = mButton ? mButton->GetLabelWidth() : 0;
+  return std::max(label + kLabelPadding, IsInGroup() ? kGroupMinimumWidth : kMinimumWidth);
+}
+
+void ButtonParameter::PlaceButton(int left, int width) {
   if (!mButton) {
     return;
   }
-  const int left = GetParameterIndentInPixels() + width / 2 - 20;
-  const int wanted = std::max(mButton->GetLabelWidth() + kLabelPadding,
-                              IsInGroup() ? kGroupMinimumWidth : kMinimumWidth);
-  const int buttonWidth = std::max(std::min(width - left, wanted), 0);
-  PlaceView(*mButton, Rect::FromSize(left, top + 2, buttonWidth,
+  const int buttonWidth = std::max(std::min(width - left, GetPreferredButtonWidth()), 0);
+  PlaceView(*mButton, Rect::FromSize(left, GetTop() + 2, buttonWidth,
                                      IsInGroup() ? kGroupButtonHeight : kButtonHeight));
+}
+
+void ButtonParameter::DrawTitle(DC& dc, const Rect& rect, const Font& font, Color color) const {
+  if (!mInLine) {
+    ParameterControl::DrawTitle(dc, rect, font, color);
+  }
 }
 
 void ButtonParameter::GetKeyframeTimes(std::set<TickTime>& /*times*/, TimeLine /*line*/) const {}

@@ -38,6 +38,14 @@ class ButtonParameter : public ParameterControl {
   void RefreshDisplayName() override;
 
   bool ObeyCommand(CommandID command) override;
+  // Nothing while the row sits in a line of buttons: the button carries the name.
+  void DrawTitle(DC& dc, const Rect& rect, const Font& font, Color color) const override;
+
+  // The button's width for its label, at least the minimum, before the row's width limits it.
+  int GetPreferredButtonWidth() const;
+  // Places the row at `top` with its button at `left` instead of after the name, for a group
+  // that lines its buttons up side by side.
+  void PositionInLine(int top, int depth, int width, int left);
 
   // True when a click would be taken (the row is enabled and not read only).
   bool CanClick() const;
@@ -52,6 +60,8 @@ class ButtonParameter : public ParameterControl {
  private:
   bool IsInGroup() const { return GetGroupLevel() != 0; }
   void OnClick();
+  void PlaceButton(int left, int width);
 
   std::shared_ptr<TextButton> mButton;
+  bool mInLine = false;  // placed by a buttons group
 };

@@ -172,7 +172,8 @@ bool EffectControlsListView::DrawItemList(DC& dc, const EffectItemList& list, in
 void EffectControlsListView::DrawFolderItem(DC& dc, EffectItem& row, const Rect& rect,
                                             const Rect& clip, int flag) {
   for (const auto& child : row.GetItems()) {
-    if (child->IsSetAside()) {
+    // A group may keep children hidden that it does not place (levels that diverge).
+    if (child->IsSetAside() || !child->IsShown()) {
       continue;
     }
     const int top = child->GetTop();

@@ -10,11 +10,16 @@
 #include "Handlers/EffectControls/Src/AudioFloatSliderParameter.h"
 #include "Handlers/EffectControls/Src/ButtonParameter.h"
 #include "Handlers/EffectControls/Src/FilterItem.h"
+#include "Handlers/EffectControls/Src/GroupButtonsBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupCurveBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupHueBalanceAndPhaseBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupHueRangeDefinitionBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupLevelsBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupLumaRangeDefinitionBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupRGBCurvesBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupSaturationRangeDefinitionBeginParameter.h"
 #include "Handlers/EffectControls/Src/GroupThreeWayHueBalanceBeginParameter.h"
+#include "Handlers/EffectControls/Src/GroupTonalRangeDefinitionBeginParameter.h"
 #include "Handlers/EffectControls/Src/OpaqueParameter.h"
 #include "Handlers/EffectControls/Src/PointSliderParameter.h"
 #include "Handlers/EffectControls/Src/TimecodeParameter.h"
@@ -233,15 +238,16 @@ std::shared_ptr<GroupBeginParameter> ParameterRowFactory::CreateGroupRow(
     case GroupKind::ThreeWayHueBalance:
       return std::make_shared<GroupThreeWayHueBalanceBeginParameter>(info);
     case GroupKind::TonalRangeDefinition:
-      return GroupStandIn("GroupTonalRangeDefinitionBeginParameter", info);
+      return std::make_shared<GroupTonalRangeDefinitionBeginParameter>(info);
     case GroupKind::Levels:
-      return GroupStandIn("GroupLevelsBeginParameter", info);
+      return std::make_shared<GroupLevelsBeginParameter>(info);
     case GroupKind::RGBCurves:
       return std::make_shared<GroupRGBCurvesBeginParameter>(info);
     case GroupKind::Buttons:
-      return GroupStandIn(request.componentIsMask ? "GroupTrackerButtonsBeginParameter"
-                                                  : "GroupButtonsBeginParameter",
-                          info);
+      if (request.componentIsMask) {
+        return GroupStandIn("GroupTrackerButtonsBeginParameter", info);
+      }
+      return std::make_shared<GroupButtonsBeginParameter>(info);
     case GroupKind::Curve:
       return std::make_shared<GroupCurveBeginParameter>(info);
     case GroupKind::ColorPickerRange:
@@ -249,9 +255,9 @@ std::shared_ptr<GroupBeginParameter> ParameterRowFactory::CreateGroupRow(
     case GroupKind::HueRangeDefinition:
       return std::make_shared<GroupHueRangeDefinitionBeginParameter>(info);
     case GroupKind::SaturationRangeDefinition:
-      return GroupStandIn("GroupSaturationRangeDefinitionBeginParameter", info);
+      return std::make_shared<GroupSaturationRangeDefinitionBeginParameter>(info);
     case GroupKind::LumaRangeDefinition:
-      return GroupStandIn("GroupLumaRangeDefinitionBeginParameter", info);
+      return std::make_shared<GroupLumaRangeDefinitionBeginParameter>(info);
     case GroupKind::SecondaryColorCorrection:
       return GroupStandIn("GroupSecondaryColorCorrectionBeginParameter", info);
     case GroupKind::None:

@@ -48,4 +48,19 @@ TEST_F(HSLRangeDefinitionControlTest, TheBarBetweenTheThresholdsMovesBothWithinT
   EXPECT_EQ(recorder.lines.back(), "HSLRangeDefinitionControlStartEndThresholdChangedQuickMessage");
 }
 
+TEST_F(HSLRangeDefinitionControlTest, KeysMoveTheLastPressedHandleWithinItsNeighbours) {
+  Click(Handle(60.0));
+  Key(KeyCode::kRight, kKeyModifierShift);
+  Key(KeyCode::kLeft);
+  EXPECT_EQ(Values(), "30 69 180 150");
+  EXPECT_EQ(recorder.lines, (std::vector<std::string>{
+                                "HSLRangeDefinitionControlStartThresholdChangedQuickMessage",
+                                "HSLRangeDefinitionControlStartThresholdChangedQuickMessage"}));
+  Click(Handle(30.0));
+  for (int i = 0; i < 5; ++i) {
+    Key(KeyCode::kRight, kKeyModifierShift);
+  }
+  EXPECT_EQ(Values(), "69 69 180 150") << "the start softness stops at the start threshold";
+}
+
 }  // namespace

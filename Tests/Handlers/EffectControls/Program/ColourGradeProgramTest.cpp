@@ -174,4 +174,63 @@ TEST_F(ColourGradeProgram, CurveWheelAndRangeDragsAreOneStepEachAndUndoRestoresT
       << "undoing the three drags did not restore the saved project";
 }
 
+// The levels group (its level rows hidden, so its controls start at its top: the input levels
+// control at the indent + 15, 22 below, W - 20 - indent wide, its handles under a 10-pixel ramp)
+// and the tonal range (laid out as the hue range, on 0..100).
+TEST_F(ColourGradeProgram, LevelsAndTonalRangeDragsAreOneStepEachAndUndoRestoresTheSavedProject) {
+  std::string opening = "time 00:00:18:00\nselect " + std::to_string(clipId) + "\n";
+  const std::vector<std::pair<std::vector<std::string>, std::string>> groups = {
+      {{"Levels", "Levels"}, "GroupLevelsBeginParameter"},
+      {{"Tonal Range", "Tonal Range"}, "GroupTonalRangeDefinitionBeginParameter"}};
+  for (std::size_t g = 0; g < groups.size(); ++g) {
+    const json dump = DumpAfter(opening, "closed" + std::to_string(g) + ".json");
+    ASSERT_FALSE(dump.is_null());
+    const auto group = FindRow(Panel(dump), groups[g].first);
+    ASSERT_TRUE(group.has_value()) << groups[g].first.back();
+    EXPECT_EQ(group->className, groups[g].second);
+    opening += "click " + TrianglePoint(PlaceOf(Panel(dump)), *group) + "\n";
+  }
+  const json openDump = DumpAfter(opening, "open.json");
+  ASSERT_FALSE(openDump.is_null());
+  const json& panel = Panel(openDump);
+  const ListPlace list = PlaceOf(panel);
+  const auto levels = FindRow(panel, {"Levels", "Levels"});
+  const auto tonal = FindRow(panel, {"Tonal Range", "Tonal Range"});
+  ASSERT_TRUE(levels && tonal);
+  ASSERT_TRUE(levels->shown && tonal->shown);
+
+  // The demo's input white level (235 of 255), dragged 30 pixels to the left.
+  const int levelsIndent = levels->groupLevel * kIndentPerGroupLevel;
+  const int levelsWidth = list.width - 20 - levelsIndent;
+  ASSERT_GT(levelsWidth, 100);
+  const int whiteX = list.left + levelsIndent + 15 + (235 * (levelsWidth - 1) + 127) / 255;
+  const int whiteY = list.top + levels->top + 22 + 10 + 3;
+  // The tonal range's shadow threshold (25 of 0..100) under its bar, 20 pixels to the right.
+  const int tonalIndent = tonal->groupLevel * kIndentPerGroupLevel;
+  const int tonalWidth = list.width - tonalIndent - 35;
+  const int shadowX = list.left + tonalIndent + 20 + (25 * (tonalWidth - 1) + 50) / 100;
+  const int shadowY = list.top + tonal->top + 5 + 18 + 4;
+
+  std::ostringstream script;
+  script << opening << "save before.project.json\n"
+         << "drag " << At(whiteX, whiteY) << " " << At(whiteX - 30, whiteY) << " steps 4\n"
+         << "dump levels.dump.json\n"
+         << "drag " << At(shadowX, shadowY) << " " << At(shadowX + 20, shadowY) << " steps 4\n"
+         << "dump tonal.dump.json\nsave edited.project.json\n"
+         << "undo\nundo\ndump undone.dump.json\nsave undone.project.json\n";
+  ASSERT_TRUE(RunProgram(out / "edits", script.str(), Options()));
+
+  const json levelsEdit = ReadJson(out / "edits" / "levels.dump.json");
+  EXPECT_EQ(UndoDone(levelsEdit), (std::vector<std::string>{"MZ.ComponentParam.SetValue"}));
+  EXPECT_TRUE(levelsEdit.at("assertions").empty()) << levelsEdit.at("assertions").dump();
+  const json tonalEdit = ReadJson(out / "edits" / "tonal.dump.json");
+  EXPECT_EQ(UndoDone(tonalEdit).size(), 2u) << "the tonal handle drag is one step";
+  EXPECT_TRUE(tonalEdit.at("assertions").empty()) << tonalEdit.at("assertions").dump();
+  const std::string before = ReadText(out / "edits" / "before.project.json");
+  EXPECT_NE(before, ReadText(out / "edits" / "edited.project.json"));
+  EXPECT_TRUE(UndoDone(ReadJson(out / "edits" / "undone.dump.json")).empty());
+  EXPECT_EQ(before, ReadText(out / "edits" / "undone.project.json"))
+      << "undoing the two drags did not restore the saved project";
+}
+
 }  // namespace
