@@ -212,7 +212,7 @@ TEST_F(ListViewTest, APanel200By300LaysOutTheColourGroupsWithNoNegativeSize) {
            Make(kMatchName_RGBCurves), Make(kMatchName_ThreeWayColor)});
   Open({200, 300});
   Select({clip});
-  ASSERT_FALSE(list->GetVideoItems().empty());
+  ASSERT_FALSE(list->GetVideoItems().IsEmpty());
   for (const auto& effect : list->GetVideoItems()) {
     effect->SetAllExpanded(true);
   }
