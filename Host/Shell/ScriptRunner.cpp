@@ -379,10 +379,8 @@ std::string ScriptRunner::RunMenuAnswer(const ScriptCommand& command) {
 }
 
 std::string ScriptRunner::CheckPopups(int line, ScriptRunResult& result) {
-  const auto& requests = mMenus->GetRequests();
   std::string error;
-  for (; mPopupsSeen < requests.size(); ++mPopupsSeen) {
-    const PopupMenuRequest& request = requests[mPopupsSeen];
+  for (const PopupMenuRequest& request : mMenus->GetRequests()) {
     if (mPendingMenuAnswers.empty()) {
       result.warnings.push_back(LineText(line) + "popup menu '" + request.menuName +
                                 "' was dismissed: no menu-answer was given");
@@ -395,6 +393,9 @@ std::string ScriptRunner::CheckPopups(int line, ScriptRunResult& result) {
               std::to_string(*answer) + "; the menu was dismissed";
     }
   }
+  // Every popup and input box is accounted for: a long script keeps no record of them.
+  mMenus->ForgetRequests();
+  mInputBoxes->ForgetRequests();
   return error;
 }
 

@@ -97,7 +97,8 @@ class ScriptRunner {
   std::optional<CommandID> LookUpCommand(const std::string& text, std::string& error) const;
   // Panel coordinates to window coordinates.
   Point ToWindow(int x, int y) const;
-  // Checks the popups shown since the last call against the answers they took.
+  // Checks the popups shown since the last call against the answers they took, then forgets
+  // them and the input boxes shown.
   std::string CheckPopups(int line, ScriptRunResult& result);
   void Settle();
 
@@ -111,6 +112,5 @@ class ScriptRunner {
   std::shared_ptr<MenuTracker> mPreviousMenus;
   std::shared_ptr<InputBoxResponder> mPreviousInputBoxes;
   std::deque<std::optional<CommandID>> mPendingMenuAnswers;  // mirrors the tracker's queue
-  std::size_t mPopupsSeen = 0;
   HistoryCheck mHistoryCheck;
 };

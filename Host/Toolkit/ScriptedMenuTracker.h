@@ -8,7 +8,7 @@
 
 // Answers popup menus from a queue (the automation script's "menu-answer", or a test): each
 // popup takes the next answer; with the queue empty the popup is dismissed. Keeps every
-// request it saw.
+// request it saw until ForgetRequests.
 class ScriptedMenuTracker : public MenuTracker {
  public:
   // nullopt dismisses the popup that takes it.
@@ -19,6 +19,8 @@ class ScriptedMenuTracker : public MenuTracker {
   void PushPick(int index) { mAnswers.push_back(Answer{std::nullopt, index < 0 ? 0 : index}); }
   std::size_t PendingAnswers() const { return mAnswers.size(); }
   const std::vector<PopupMenuRequest>& GetRequests() const { return mRequests; }
+  // A long script's runner forgets what it has looked at, so the record does not grow.
+  void ForgetRequests() { mRequests.clear(); }
   // Popups shown while no answer was queued.
   int GetUnansweredCount() const { return mUnanswered; }
 
