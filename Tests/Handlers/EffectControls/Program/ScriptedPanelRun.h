@@ -89,6 +89,42 @@ inline bool RunProgram(const fs::path& out, const std::string& script,
   return true;
 }
 
+// Runs `lines` as a script in EC_OUT/<test>/<name> (made afresh, returned in `dir`) at 1100x620;
+// false (with a failure) when the program fails, warns (a click or an answer reached nothing) or
+// a dump recorded a debug assertion.
+inline bool RunScriptLines(const std::string& name, const std::vector<std::string>& lines,
+                           fs::path& dir) {
+  dir = fs::path(EC_OUT) / ::testing::UnitTest::GetInstance()->current_test_info()->name() / name;
+  fs::remove_all(dir);
+  fs::create_directories(dir);
+  const fs::path script = dir / (name + ".ecs");
+  {
+    std::ofstream out(script);
+    for (const std::string& line : lines) {
+      out << line << "\n";
+    }
+  }
+  const fs::path log = dir / "run.log";
+  if (!RunProgramWith(
+          {"--headless", "--size", "1100x620", "--script", script.string(), "--out", dir.string()},
+          log)) {
+    return false;
+  }
+  const std::string output = ReadText(log);
+  if (output.find("warning:") != std::string::npos) {
+    ADD_FAILURE() << name << ": a click or an answer went nowhere\n" << output;
+    return false;
+  }
+  for (const auto& entry : fs::directory_iterator(dir)) {
+    if (entry.path().string().ends_with(".dump.json") &&
+        !ReadJson(entry.path())["assertions"].empty()) {
+      ADD_FAILURE() << entry.path() << " recorded " << ReadJson(entry.path())["assertions"].dump();
+      return false;
+    }
+  }
+  return true;
+}
+
 inline const json& Panel(const json& dump) {
   for (const json& panel : dump.at("panels")) {
     if (panel.value("dumped", false)) {

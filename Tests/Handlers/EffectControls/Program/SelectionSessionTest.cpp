@@ -30,38 +30,8 @@ using Strings = std::vector<std::string>;
 
 class SelectionSession : public ::testing::Test {
  protected:
-  // Runs `lines` as a script in EC_OUT/<test>/<name>; false (with a failure) when the program
-  // fails, warns (a click reached nothing) or a dump recorded a debug assertion.
   bool Run(const std::string& name, const Strings& lines) {
-    dir = fs::path(EC_OUT) / ::testing::UnitTest::GetInstance()->current_test_info()->name() / name;
-    fs::remove_all(dir);
-    fs::create_directories(dir);
-    const fs::path script = dir / (name + ".ecs");
-    {
-      std::ofstream out(script);
-      for (const std::string& line : lines) {
-        out << line << "\n";
-      }
-    }
-    const fs::path log = dir / "run.log";
-    if (!RunProgramWith({"--headless", "--size", "1100x620", "--script", script.string(), "--out",
-                         dir.string()},
-                        log)) {
-      return false;
-    }
-    const std::string output = ReadText(log);
-    if (output.find("warning:") != std::string::npos) {
-      ADD_FAILURE() << name << ": a click or an answer went nowhere\n" << output;
-      return false;
-    }
-    for (const auto& entry : fs::directory_iterator(dir)) {
-      if (entry.path().string().ends_with(".dump.json") &&
-          !Dump(entry.path())["assertions"].empty()) {
-        ADD_FAILURE() << entry.path() << " recorded " << Dump(entry.path())["assertions"].dump();
-        return false;
-      }
-    }
-    return true;
+    return program_test::RunScriptLines(name, lines, dir);
   }
 
   static json Dump(const fs::path& path) {

@@ -55,32 +55,6 @@ std::optional<long long> EffectsClipId() {
   return std::nullopt;
 }
 
-// The parameter `paramName` of the effect `matchName` on the track item `itemId` of a saved
-// project; null when there is none.
-const json* FindParam(const json& project, long long itemId, const char* matchName,
-                      const char* paramName) {
-  for (const json& sequence : project.at("sequences")) {
-    for (const json& track : sequence.at("tracks")) {
-      for (const json& item : track.at("items")) {
-        if (item.at("id").get<long long>() != itemId) {
-          continue;
-        }
-        for (const json& component : item.at("chain").at("components")) {
-          if (component.value("matchName", "") != matchName) {
-            continue;
-          }
-          for (const json& param : component.at("params")) {
-            if (param.value("name", "") == paramName) {
-              return &param;
-            }
-          }
-        }
-      }
-    }
-  }
-  return nullptr;
-}
-
 // Panel coordinates of a point `dx` into the row's value controls, halfway down its band.
 std::string ControlPoint(const ListPlace& list, const Row& row, int dx) {
   const int controlsLeft = row.groupLevel * kIndentPerGroupLevel + list.width / 2 - 20;
@@ -263,7 +237,7 @@ TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProje
   // What the edits wrote, read from the saved file.
   const json edited = ReadJson(out / "edits" / "edited.project.json");
   const auto value = [&](const char* matchName, const char* paramName) {
-    const json* param = FindParam(edited, clipId, matchName, paramName);
+    const json* param = FindProjectParam(edited, clipId, matchName, paramName);
     return param != nullptr ? param->at("value") : json();
   };
   EXPECT_EQ(value("XO.KRVN Opacity", "Opacity"), (json{{"double", 42.0}}));
@@ -272,7 +246,7 @@ TEST_P(ValueRowsProgram, EachEditIsOneStepAndUndoingThemAllRestoresTheSavedProje
   // 00:00:02:10 at 25 fps is frame 60, stored in ticks.
   EXPECT_EQ(value("XO.KRVN Timecode", "Starting Timecode"),
             (json{{"double", 60.0 * 10160640000.0}}));
-  const json* settings = FindParam(edited, clipId, "XO.KRVN GridDistortion", "Settings");
+  const json* settings = FindProjectParam(edited, clipId, "XO.KRVN GridDistortion", "Settings");
   ASSERT_NE(settings, nullptr);
   EXPECT_TRUE(settings->at("timeVarying").get<bool>());
   if (ownRows) {
