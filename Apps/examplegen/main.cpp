@@ -27,7 +27,7 @@ constexpr TickTime Seconds(double s) {
 }
 
 void Keyframes(const ComponentParamRef& param,
-               std::initializer_list<ProjectBuilder::KeyframeSpec> keys) {
+               std::initializer_list<ProjectBuilder::KeyframeEntry> keys) {
   if (!ProjectBuilder::AddKeyframes(param, keys)) {
     std::fprintf(stderr, "examplegen: keyframe of %s refused\n", param->GetName().c_str());
   }
@@ -74,7 +74,7 @@ ProjectRef BuildDemo() {
 
   // Clip 1: intrinsics, two applied effects, keyframes of every interpolation, and linked audio
   // in three parts whose order keys are not the track order.
-  const ProjectBuilder::ClipSpec beachSpan{
+  const ProjectBuilder::ClipPlacement beachSpan{
       .start = 0, .end = Seconds(8), .mediaIn = Seconds(2), .linkGroup = 1};
   auto beachVideo = b.AddClip(v1, beach, beachSpan);
   auto blur = b.AddEffect(beachVideo, kMatchName_GaussianBlur);
@@ -104,7 +104,7 @@ ProjectRef BuildDemo() {
   b.AddEffect(part1, kMatchName_Delay);
 
   // Clip 2 with a video and an audio transition over the cut.
-  const ProjectBuilder::ClipSpec sunsetSpan{
+  const ProjectBuilder::ClipPlacement sunsetSpan{
       .start = Seconds(8), .end = Seconds(16), .linkGroup = 2};
   b.AddClip(v1, sunset, sunsetSpan);
   b.AddClip(a1, sunset, sunsetSpan);

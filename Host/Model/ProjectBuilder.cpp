@@ -83,25 +83,25 @@ TrackRef ProjectBuilder::AddTrack(const SequenceRef& sequence, MediaType mediaTy
 }
 
 TrackItemRef ProjectBuilder::AddClip(const TrackRef& track, const MasterClipRef& masterClip,
-                                     const ClipSpec& spec) {
+                                     const ClipPlacement& placement) {
   const MediaType mediaType = track->GetMediaType();
-  TrackItemRef item =
-      Number(TrackItem::CreateClip(mediaType, spec.start, spec.end, masterClip, spec.mediaIn));
-  if (spec.id != 0) {
-    item->SetID(spec.id);
+  TrackItemRef item = Number(TrackItem::CreateClip(mediaType, placement.start, placement.end,
+                                                   masterClip, placement.mediaIn));
+  if (placement.id != 0) {
+    item->SetID(placement.id);
   }
   const ComponentChainRef& chain = Number(item->GetComponentChain());
-  if (spec.withIntrinsics) {
+  if (placement.withIntrinsics) {
     for (const ComponentRef& intrinsic : Catalogue().CreateIntrinsics(mediaType)) {
       chain->Append(NumberComponent(intrinsic));
     }
   }
-  for (const ComponentRef& effect : spec.effects) {
+  for (const ComponentRef& effect : placement.effects) {
     chain->Append(NumberComponent(effect));
   }
   track->AddItem(item);
-  if (spec.linkGroup != 0) {
-    item->SetLinkGroup(spec.linkGroup);
+  if (placement.linkGroup != 0) {
+    item->SetLinkGroup(placement.linkGroup);
   }
   return item;
 }
@@ -135,14 +135,14 @@ ComponentRef ProjectBuilder::AddComponent(const ComponentChainRef& chain, Compon
 }
 
 bool ProjectBuilder::AddKeyframes(const ComponentParamRef& param,
-                                  std::initializer_list<KeyframeSpec> keys) {
+                                  std::initializer_list<KeyframeEntry> keys) {
   if (param == nullptr) {
     return false;
   }
   ComponentParam::State state = param->GetState();
   state.timeVarying = true;
   bool tookAll = true;
-  for (const KeyframeSpec& key : keys) {
+  for (const KeyframeEntry& key : keys) {
     Keyframe keyframe;
     keyframe.time = key.time;
     keyframe.value = key.value;

@@ -23,14 +23,14 @@
 // Ids::Sequential the builder numbers what it makes 1, 2, 3, ... in the order of its calls, so
 // a file written from the project is the same on every run. Objects made elsewhere and handed
 // to AddComponent are numbered too; objects made by other means keep their ids. Either way an
-// explicit id (ClipSpec::id, AddTransition's `id`) replaces the one the object would get.
+// explicit id (ClipPlacement::id, AddTransition's `id`) replaces the one the object would get.
 class ProjectBuilder {
  public:
   enum class Ids { Automatic, Sequential };
   enum class Streams { Video, Audio, VideoAndAudio };
 
   // An id of 0 asks for the builder's own.
-  struct ClipSpec {
+  struct ClipPlacement {
     TickTime start = 0;  // sequence time
     TickTime end = 0;
     TickTime mediaIn = 0;  // media time at `start`
@@ -40,7 +40,7 @@ class ProjectBuilder {
     std::vector<ComponentRef> effects = {};  // adopted after the intrinsics, numbered like them
   };
 
-  struct KeyframeSpec {
+  struct KeyframeEntry {
     TickTime time = 0;  // clip time
     ParamValue value = 0.0;
     TemporalInterpolation interpolation = TemporalInterpolation::Linear;
@@ -66,7 +66,7 @@ class ProjectBuilder {
   // A clip of `masterClip` (null for a generated item) on `track`, of the track's media type.
   // Its chain is complete when it goes on the track; its link group is set after that.
   TrackItemRef AddClip(const TrackRef& track, const MasterClipRef& masterClip,
-                       const ClipSpec& spec);
+                       const ClipPlacement& placement);
   TrackItemRef AddTransition(const TrackRef& track, TickTime start, TickTime end,
                              TransitionData data, ObjectID id = 0);
 
@@ -81,7 +81,7 @@ class ProjectBuilder {
   // Makes `param` time-varying with these keyframes (clip time). False when the parameter is
   // null or refuses a keyframe; it then keeps those it took.
   static bool AddKeyframes(const ComponentParamRef& param,
-                           std::initializer_list<KeyframeSpec> keys);
+                           std::initializer_list<KeyframeEntry> keys);
 
  private:
   template <class Ref>

@@ -13,8 +13,8 @@ constexpr TickTime Seconds(double s) {
 }
 
 TrackItemRef AddVideoClip(ProjectBuilder& builder, const TrackRef& track, const MasterClipRef& clip,
-                          const ProjectBuilder::ClipSpec& spec) {
-  TrackItemRef item = builder.AddClip(track, clip, spec);
+                          const ProjectBuilder::ClipPlacement& placement) {
+  TrackItemRef item = builder.AddClip(track, clip, placement);
   builder.AddEffect(item, kMatchName_GaussianBlur);
   return item;
 }

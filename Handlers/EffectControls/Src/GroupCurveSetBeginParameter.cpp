@@ -16,8 +16,8 @@ constexpr int kUnusedLevel = -1;
 }  // namespace
 
 GroupCurveSetBeginParameter::GroupCurveSetBeginParameter(const ParameterControlInfo& info,
-                                                         std::vector<CurveSpec> curves)
-    : GroupBeginParameter(info), mSpecs(std::move(curves)) {}
+                                                         std::vector<CurveLook> curves)
+    : GroupBeginParameter(info), mLooks(std::move(curves)) {}
 
 GroupCurveSetBeginParameter::~GroupCurveSetBeginParameter() = default;
 
@@ -80,11 +80,11 @@ std::vector<ParamValue> GroupCurveSetBeginParameter::ToParamValues(const CurvePo
 
 void GroupCurveSetBeginParameter::CreateControlsSelf() {
   GroupBeginParameter::CreateControlsSelf();
-  for (std::size_t i = 0; i < mSpecs.size(); ++i) {
+  for (std::size_t i = 0; i < mLooks.size(); ++i) {
     auto curve = AdoptControl(std::make_shared<CurveControl>(
         Rect{},
-        CurveControl::Options{.label = mSpecs[i].label,
-                              .curveColor = mSpecs[i].color,
+        CurveControl::Options{.label = mLooks[i].label,
+                              .curveColor = mLooks[i].color,
                               .cookie = static_cast<std::int32_t>(i)},
         this));
     if (!curve) {
@@ -156,7 +156,7 @@ void GroupCurveSetBeginParameter::SynchGroupToTime() {
   if (mWriting || !IsShowingCurves()) {
     return;
   }
-  for (std::size_t i = 0; i < mCurves.size(); ++i) {
+  for (std::size_t i = 0; i < mLooks.size(); ++i) {
     mCurves[i]->SetCurvePointList(ReadCurvePoints(i));
   }
 }

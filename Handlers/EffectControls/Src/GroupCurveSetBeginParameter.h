@@ -45,11 +45,11 @@ class GroupCurveSetBeginParameter : public GroupBeginParameter {
   static int ToLevel(double value);
 
  protected:
-  struct CurveSpec {
+  struct CurveLook {
     const char* label;
     Color color;
   };
-  GroupCurveSetBeginParameter(const ParameterControlInfo& info, std::vector<CurveSpec> curves);
+  GroupCurveSetBeginParameter(const ParameterControlInfo& info, std::vector<CurveLook> curves);
 
   void CreateControlsSelf() override;
   void DestroyControlsSelf() override;
@@ -65,7 +65,7 @@ class GroupCurveSetBeginParameter : public GroupBeginParameter {
   std::vector<ComponentParamRef> CurveParams(std::size_t index) const;
   bool IsShowingCurves() const;
 
-  std::vector<CurveSpec> mSpecs;
+  std::vector<CurveLook> mLooks;
   std::vector<std::shared_ptr<CurveControl>> mCurves;
   std::unique_ptr<MultiComponentParamActor> mActor;
   std::optional<std::size_t> mActorCurve;  // the curve the open edit belongs to

@@ -39,11 +39,11 @@ class EditingModelTest : public ::testing::Test {
     clipA = builder.AddMasterClip("A", mediaA);
     clipB = builder.AddMasterClip("B", mediaB);
 
-    const ProjectBuilder::ClipSpec spanA{
+    const ProjectBuilder::ClipPlacement spanA{
         .start = 0, .end = 5 * kSec, .mediaIn = 2 * kSec, .linkGroup = 1};
-    const ProjectBuilder::ClipSpec spanB{
+    const ProjectBuilder::ClipPlacement spanB{
         .start = 5 * kSec, .end = 10 * kSec, .mediaIn = 3 * kSec, .linkGroup = 2};
-    const ProjectBuilder::ClipSpec spanC{
+    const ProjectBuilder::ClipPlacement spanC{
         .start = 12 * kSec, .end = 14 * kSec, .mediaIn = 10 * kSec, .linkGroup = 3};
     a = builder.AddClip(v1, clipA, spanA);
     b = builder.AddClip(v1, clipB, spanB);

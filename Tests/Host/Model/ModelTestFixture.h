@@ -42,7 +42,7 @@ class ModelTest : public ::testing::Test {
     media = builder.AddMedia("interview.mov", 60 * kSecond, ProjectBuilder::Streams::VideoAndAudio);
     masterClip = builder.AddMasterClip("Interview", media);
 
-    const ProjectBuilder::ClipSpec interview{
+    const ProjectBuilder::ClipPlacement interview{
         .start = 2 * kSecond, .end = 7 * kSecond, .mediaIn = kSecond, .linkGroup = 1};
     video = builder.AddClip(v1, masterClip, interview);
     audio1 = builder.AddClip(a1, masterClip, interview);
