@@ -2,6 +2,7 @@
 
 #include "Host/Messaging/Station.h"
 #include "Host/Model/ComponentChain.h"
+#include "Host/Model/ModelMessages.h"
 #include "Host/Model/Project.h"
 #include "Host/Model/Sequence.h"
 #include "Host/Model/Track.h"
@@ -20,11 +21,15 @@ ProgramMonitorView::~ProgramMonitorView() {
   RemoveListenerFromAllStations(*this);
 }
 
-void ProgramMonitorView::ListenToMessage(const Message& /*message*/) {
+void ProgramMonitorView::ListenToMessage(const Message& message) {
+  if (message.Is<SequenceChangedMessage>())
+    mListeningStale = true;
   Invalidate();
 }
 
 void ProgramMonitorView::ListenTo(const SequenceRef& sequence) {
+  mListened = sequence;
+  mListeningStale = false;
   RemoveListenerFromAllStations(*this);
   AddListener(kSequenceActivationStation, *this);
   if (sequence == nullptr)
@@ -53,7 +58,8 @@ void ProgramMonitorView::SetBoundsSelf(const Rect& /*bounds*/) {
 
 void ProgramMonitorView::PaintSelf(DC& dc) {
   const SequenceRef sequence = mApplication.GetActiveSequence();
-  ListenTo(sequence);
+  if (sequence != mListened || mListeningStale)
+    ListenTo(sequence);
   const Size size = GetSize();
   if (sequence == nullptr || size.width <= 0 || size.height <= 0) {
     dc.FillRect({0, 0, size.width, size.height}, Color(0, 0, 0));

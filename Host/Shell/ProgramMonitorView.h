@@ -26,8 +26,10 @@ class ProgramMonitorView : public SubView, public Listener {
 
  private:
   // Listens to what the picture shows: the sequence, its player, the project's history and the
-  // effect chains of the clips drawn.
+  // effect chains of its video clips.
   void ListenTo(const SequenceRef& sequence);
 
   Application& mApplication;
+  SequenceRef mListened;        // the sequence ListenTo was last given
+  bool mListeningStale = true;  // the sequence's structure changed since: other chains
 };

@@ -171,8 +171,9 @@ void TimelineView::PaintSelf(DC& dc) {
   if (sequence == nullptr)
     return;
   const std::vector<TrackRef> tracks = TracksTopFirst(*sequence);
+  const std::vector<ItemPlace> places = GetItemPlaces();
   for (std::size_t row = 0; row < tracks.size(); ++row)
-    PaintTrack(dc, *sequence, tracks[row], TrackRect(row));
+    PaintTrack(dc, *sequence, places, tracks[row], TrackRect(row));
   PaintRuler(dc, *sequence);
   const int x = static_cast<int>(std::lround(TimeToX(sequence->GetCurrentTime())));
   if (x >= kHeaderWidth)
@@ -198,7 +199,8 @@ void TimelineView::PaintRuler(DC& dc, const Sequence& sequence) const {
   }
 }
 
-void TimelineView::PaintTrack(DC& dc, const Sequence& sequence, const TrackRef& track,
+void TimelineView::PaintTrack(DC& dc, const Sequence& sequence,
+                              const std::vector<ItemPlace>& places, const TrackRef& track,
                               const Rect& row) const {
   dc.FillRect(row, kTrackColor);
   dc.DrawLine({0, row.bottom - 1}, {row.right, row.bottom - 1}, kTrackLine);
@@ -207,7 +209,7 @@ void TimelineView::PaintTrack(DC& dc, const Sequence& sequence, const TrackRef& 
   dc.DrawText(track->GetName(), {4, row.top, kHeaderWidth - 2, row.bottom}, font, kHeaderText,
               TextAlign::kLeft, TextVAlign::kCenter);
   dc.PushClip({kHeaderWidth, row.top, row.right, row.bottom});
-  for (const ItemPlace& place : GetItemPlaces()) {
+  for (const ItemPlace& place : places) {
     if (place.item->GetTrack() != track.get())
       continue;
     const bool transition = place.item->IsTransition();

@@ -63,7 +63,8 @@ class TimelineView : public SubView, public Listener {
   void SelectOnClick(const SequenceRef& sequence, const TrackItemRef& item, KeyModifiers modifiers);
   void Scrub(int x);
   void PaintRuler(DC& dc, const Sequence& sequence) const;
-  void PaintTrack(DC& dc, const Sequence& sequence, const TrackRef& track, const Rect& row) const;
+  void PaintTrack(DC& dc, const Sequence& sequence, const std::vector<ItemPlace>& places,
+                  const TrackRef& track, const Rect& row) const;
 
   Application& mApplication;
   SequenceRef mSequence;  // the one whose stations this view is on

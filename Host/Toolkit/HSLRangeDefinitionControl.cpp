@@ -8,6 +8,7 @@
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/KeyModifiers.h"
+#include "Host/Toolkit/RangeBarScale.h"
 
 HSLRangeDefinitionControl::HSLRangeDefinitionControl(const Rect& bounds, double minimum,
                                                      double maximum, Commander* commander)
@@ -49,19 +50,11 @@ HSLRangeDefinitionValues HSLRangeDefinitionControl::GetValues() const {
 }
 
 int HSLRangeDefinitionControl::ValueToLocal(double value) const {
-  const int span = std::max(0, GetLocalBounds().Width() - 1);
-  if (mMaximum <= mMinimum) {
-    return 0;
-  }
-  return static_cast<int>(std::lround((value - mMinimum) / (mMaximum - mMinimum) * span));
+  return RangeBarScale{mMinimum, mMaximum, GetLocalBounds().Width()}.ValueToX(value);
 }
 
 double HSLRangeDefinitionControl::LocalToValue(int x) const {
-  const int span = GetLocalBounds().Width() - 1;
-  if (span <= 0) {
-    return mMinimum;
-  }
-  return std::clamp(mMinimum + (mMaximum - mMinimum) * x / span, mMinimum, mMaximum);
+  return RangeBarScale{mMinimum, mMaximum, GetLocalBounds().Width()}.XToValue(x);
 }
 
 std::optional<HSLRangeDefinitionControl::Handle> HSLRangeDefinitionControl::HitHandle(

@@ -8,6 +8,7 @@
 #include "Host/Toolkit/ColorManager.h"
 #include "Host/Toolkit/DC.h"
 #include "Host/Toolkit/KeyModifiers.h"
+#include "Host/Toolkit/RangeBarScale.h"
 
 namespace {
 
@@ -57,19 +58,11 @@ TonalRangeDefinitionValues TonalRangeDefinitionControl::GetValues() const {
 }
 
 int TonalRangeDefinitionControl::ValueToLocal(double value) const {
-  const int span = std::max(0, GetLocalBounds().Width() - 1);
-  if (mMaximum <= mMinimum) {
-    return 0;
-  }
-  return static_cast<int>(std::lround((value - mMinimum) / (mMaximum - mMinimum) * span));
+  return RangeBarScale{mMinimum, mMaximum, GetLocalBounds().Width()}.ValueToX(value);
 }
 
 double TonalRangeDefinitionControl::LocalToValue(int x) const {
-  const int span = GetLocalBounds().Width() - 1;
-  if (span <= 0) {
-    return mMinimum;
-  }
-  return std::clamp(mMinimum + (mMaximum - mMinimum) * x / span, mMinimum, mMaximum);
+  return RangeBarScale{mMinimum, mMaximum, GetLocalBounds().Width()}.XToValue(x);
 }
 
 int TonalRangeDefinitionControl::HandleToLocal(Handle handle) const {
